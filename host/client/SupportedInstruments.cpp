@@ -1,0 +1,10 @@
+#include "SupportedInstruments.h"
+
+namespace vemi {
+
+bool SupportedInstruments::supportsSpecificInstrument(std::shared_ptr<Instrument>)
+{
+    return false;
+}
+
+} // namespace vemi

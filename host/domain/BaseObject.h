@@ -1,0 +1,53 @@
+#pragma once
+
+#include <QCborMap>
+#include <QUuid>
+
+#include <functional>
+#include <memory>
+#include <string>
+#include <vector>
+
+namespace vemi {
+
+class Header;
+
+// Root of every object the store keeps. Each object has a UUID string id that
+// survives serialisation, a type id naming its class, and a header with its
+// display name and description. Objects are held by std::shared_ptr.
+class BaseObject
+{
+public:
+    BaseObject();
+    BaseObject(const BaseObject&) = delete;
+    BaseObject& operator=(const BaseObject&) = delete;
+    virtual ~BaseObject();
+
+    std::string id() const { return m_id; }
+    void setId(const std::string& id) { m_id = id; }
+    QUuid uuid() const;
+
+    // The type id of the object's own class, equal to that class's static typeId().
+    virtual std::string objectTypeId() const = 0;
+    virtual std::shared_ptr<Header> header() const { return m_header; }
+
+    // Writes the fields of the object's class (not type, id or header) into map;
+    // ObjectCodec adds those three.
+    virtual void writeFields(QCborMap& map) const;
+    // Reads what writeFields wrote. Throws DecodeError on a malformed field.
+    virtual void readFields(const QCborMap& map);
+
+    // Ids of objects stored on their own that this object refers to (the
+    // members of a library). Such members are stored as ids and decoded as
+    // stand-ins that carry only their id, until resolveReferences replaces them.
+    virtual std::vector<std::string> referencedIds() const;
+    using ObjectLookup = std::function<std::shared_ptr<BaseObject>(const std::string& id)>;
+    // Replaces each stand-in by lookup(id); a stand-in whose lookup is empty stays.
+    virtual void resolveReferences(const ObjectLookup& lookup);
+
+private:
+    std::string m_id;
+    std::shared_ptr<Header> m_header;
+};
+
+} // namespace vemi

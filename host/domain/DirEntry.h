@@ -1,0 +1,32 @@
+#pragma once
+
+#include "BaseObject.h"
+
+namespace vemi {
+
+// An entry of the store's folder tree: it names a stored object by id and
+// type and the folder it sits in. Its display name is the header's name.
+class DirEntry : public BaseObject
+{
+public:
+    static const std::string& typeId();
+    std::string objectTypeId() const override;
+
+    std::string entryObjectId() const { return m_entryObjectId; }
+    void setEntryObjectId(const std::string& id) { m_entryObjectId = id; }
+    std::string entryObjectType() const { return m_entryObjectType; }
+    void setEntryObjectType(const std::string& type) { m_entryObjectType = type; }
+    // Empty for an entry at the top level.
+    std::string folderId() const { return m_folderId; }
+    void setFolderId(const std::string& id) { m_folderId = id; }
+
+    void writeFields(QCborMap& map) const override;
+    void readFields(const QCborMap& map) override;
+
+private:
+    std::string m_entryObjectId;
+    std::string m_entryObjectType;
+    std::string m_folderId;
+};
+
+} // namespace vemi

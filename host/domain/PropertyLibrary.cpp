@@ -1,0 +1,62 @@
+#include "PropertyLibrary.h"
+
+#include "ObjectCodec.h"
+#include "TagDefinition.h"
+
+namespace vemi {
+
+const std::string& PropertyLibrary::typeId()
+{
+    static const std::string id = "vemi.PropertyLibrary";
+    return id;
+}
+
+std::string PropertyLibrary::objectTypeId() const
+{
+    return typeId();
+}
+
+void PropertyLibrary::setProperties(const std::vector<std::shared_ptr<TagDefinition>>& properties)
+{
+    m_properties = properties;
+}
+
+void PropertyLibrary::writeFields(QCborMap& map) const
+{
+    NamedObject::writeFields(map);
+    map.insert(QStringLiteral("propertyIds"), ObjectCodec::textList(referencedIds()));
+}
+
+void PropertyLibrary::readFields(const QCborMap& map)
+{
+    NamedObject::readFields(map);
+    m_properties.clear();
+    for (const std::string& id : ObjectCodec::readTextList(map, QStringLiteral("propertyIds"))) {
+        auto standIn = std::make_shared<TagDefinition>();
+        standIn->setId(id);
+        m_properties.push_back(standIn);
+    }
+}
+
+std::vector<std::string> PropertyLibrary::referencedIds() const
+{
+    std::vector<std::string> ids;
+    ids.reserve(m_properties.size());
+    for (const auto& property : m_properties) {
+        if (property)
+            ids.push_back(property->id());
+    }
+    return ids;
+}
+
+void PropertyLibrary::resolveReferences(const ObjectLookup& lookup)
+{
+    for (auto& property : m_properties) {
+        if (!property)
+            continue;
+        if (auto found = std::dynamic_pointer_cast<TagDefinition>(lookup(property->id())))
+            property = found;
+    }
+}
+
+} // namespace vemi

@@ -1,0 +1,33 @@
+#pragma once
+
+#include "NamedObject.h"
+
+#include <memory>
+#include <vector>
+
+namespace vemi {
+
+class TagDefinition;
+
+// A named collection of tag definitions. The definitions are stored on their
+// own and referred to by id: a decoded library holds stand-ins that carry only
+// their ids until resolveReferences swaps in the stored definitions.
+class PropertyLibrary : public NamedObject
+{
+public:
+    static const std::string& typeId();
+    std::string objectTypeId() const override;
+
+    std::vector<std::shared_ptr<TagDefinition>> properties() const { return m_properties; }
+    void setProperties(const std::vector<std::shared_ptr<TagDefinition>>& properties);
+
+    void writeFields(QCborMap& map) const override;
+    void readFields(const QCborMap& map) override;
+    std::vector<std::string> referencedIds() const override;
+    void resolveReferences(const ObjectLookup& lookup) override;
+
+private:
+    std::vector<std::shared_ptr<TagDefinition>> m_properties;
+};
+
+} // namespace vemi

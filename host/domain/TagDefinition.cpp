@@ -1,0 +1,32 @@
+#include "TagDefinition.h"
+
+#include "ObjectCodec.h"
+
+namespace vemi {
+
+const std::string& TagDefinition::typeId()
+{
+    static const std::string id = "vemi.TagDefinition";
+    return id;
+}
+
+std::string TagDefinition::objectTypeId() const
+{
+    return typeId();
+}
+
+void TagDefinition::writeFields(QCborMap& map) const
+{
+    NamedObject::writeFields(map);
+    map.insert(QStringLiteral("defaultValue"), ObjectCodec::text(m_defaultValue));
+    map.insert(QStringLiteral("allowedValues"), ObjectCodec::textList(m_allowedValues));
+}
+
+void TagDefinition::readFields(const QCborMap& map)
+{
+    NamedObject::readFields(map);
+    m_defaultValue = ObjectCodec::readText(map, QStringLiteral("defaultValue"));
+    m_allowedValues = ObjectCodec::readTextList(map, QStringLiteral("allowedValues"));
+}
+
+} // namespace vemi

@@ -1,0 +1,28 @@
+#include "CreateFolder.h"
+
+#include "DirectoryQueries.h"
+#include "FolderResponse.h"
+#include "StoreDatabase.h"
+
+#include <QUuid>
+
+namespace vemi {
+
+std::shared_ptr<Response> CreateFolder::execute(StoreDatabase& database)
+{
+    DirFolder folder{QUuid::createUuid().toString(QUuid::WithoutBraces).toStdString(), m_parentId, m_name,
+                     m_objectType};
+    database.writeTransaction([&] {
+        DirectoryQueries queries(database);
+        queries.requireFolder(m_parentId, "create the folder");
+        queries.requireFreeFolderName(m_objectType, m_parentId, m_name, std::string());
+        database.run(QStringLiteral("INSERT INTO folders(id, object_type, parent_id, name) VALUES(?, ?, ?, ?)"),
+                     {QString::fromStdString(folder.id), QString::fromStdString(m_objectType),
+                      m_parentId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(m_parentId)),
+                      QString::fromStdString(m_name)},
+                     "create the folder");
+    });
+    return std::make_shared<FolderResponse>(folder);
+}
+
+} // namespace vemi

@@ -1,0 +1,49 @@
+#include "DirectoryQueries.h"
+
+#include "StoreDatabase.h"
+#include "StoreError.h"
+
+namespace vemi {
+
+namespace {
+
+QVariant nullable(const std::string& id)
+{
+    return id.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(id));
+}
+
+} // namespace
+
+void DirectoryQueries::requireFolder(const std::string& folderId, const char* operation)
+{
+    if (folderId.empty())
+        return;
+    if (!m_database.scalar(QStringLiteral("SELECT 1 FROM folders WHERE id = ?"),
+                           {QString::fromStdString(folderId)}, operation).isValid())
+        throw StoreError("the folder no longer exists");
+}
+
+void DirectoryQueries::requireFreeFolderName(const std::string& objectType, const std::string& parentId,
+                                             const std::string& name, const std::string& exceptId)
+{
+    if (name.empty())
+        throw StoreError("a folder needs a name");
+    const QVariant clash = m_database.scalar(
+        QStringLiteral("SELECT 1 FROM folders WHERE object_type = ? AND parent_id IS ? AND name = ? AND id <> ?"),
+        {QString::fromStdString(objectType), nullable(parentId), QString::fromStdString(name),
+         QString::fromStdString(exceptId)},
+        "name the folder");
+    if (clash.isValid())
+        throw StoreError("a folder named \"" + name + "\" already exists there");
+}
+
+bool DirectoryQueries::isInSubtree(const std::string& folderId, const std::string& rootId)
+{
+    return m_database.scalar(
+        QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT ? UNION ALL"
+                       " SELECT f.id FROM folders f JOIN sub ON f.parent_id = sub.id)"
+                       " SELECT 1 FROM sub WHERE id = ?"),
+        {QString::fromStdString(rootId), QString::fromStdString(folderId)}, "move the folder").isValid();
+}
+
+} // namespace vemi

@@ -1,0 +1,26 @@
+#pragma once
+
+#include <string>
+
+namespace vemi {
+
+class StoreDatabase;
+
+// Checks on the folder tree that the directory commands share.
+class DirectoryQueries
+{
+public:
+    explicit DirectoryQueries(StoreDatabase& database) : m_database(database) {}
+
+    // Throws StoreError when parentId names no folder (an empty id is the top level).
+    void requireFolder(const std::string& folderId, const char* operation);
+    // Throws StoreError when a sibling folder already has the name.
+    void requireFreeFolderName(const std::string& objectType, const std::string& parentId,
+                               const std::string& name, const std::string& exceptId);
+    bool isInSubtree(const std::string& folderId, const std::string& rootId);
+
+private:
+    StoreDatabase& m_database;
+};
+
+} // namespace vemi

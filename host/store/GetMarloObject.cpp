@@ -1,0 +1,18 @@
+#include "GetMarloObject.h"
+
+#include "GetMarloObjectResponse.h"
+#include "StoredObjectReader.h"
+
+namespace vemi {
+
+std::shared_ptr<Response> GetMarloObject::execute(StoreDatabase& database)
+{
+    return std::make_shared<GetMarloObjectResponse>(StoredObjectReader(database).read(m_id, m_type, m_depth));
+}
+
+std::string GetMarloObject::description() const
+{
+    return "read the object " + m_id;
+}
+
+} // namespace vemi

@@ -1,0 +1,61 @@
+#include "MarloModel.h"
+
+#include "StoreDispatcher.h"
+
+#include <QDir>
+#include <QFileInfo>
+#include <QStandardPaths>
+
+namespace vemi {
+
+const std::string& MarloModel::defaultDispatcherId()
+{
+    static const std::string id = "Local";
+    return id;
+}
+
+QString MarloModel::standardStorePath()
+{
+    return QStandardPaths::writableLocation(QStandardPaths::AppDataLocation) + QStringLiteral("/store.sqlite");
+}
+
+MarloModel::MarloModel(QString defaultStorePath, StoreOptions options)
+    : m_defaultStorePath(std::move(defaultStorePath)), m_options(options)
+{
+    addStore(defaultDispatcherId(), m_defaultStorePath);
+}
+
+MarloModel::~MarloModel() = default;
+
+QString MarloModel::open()
+{
+    const QString folder = QFileInfo(m_defaultStorePath).absolutePath();
+    if (!QDir().mkpath(folder))
+        return QStringLiteral("Cannot create the folder of the store: %1").arg(folder);
+    auto dispatcher = std::dynamic_pointer_cast<StoreDispatcher>(commandDispatcher(defaultDispatcherId()));
+    return dispatcher ? dispatcher->openAndWait() : QString();
+}
+
+std::shared_ptr<CommandDispatcher> MarloModel::commandDispatcher(const std::string& dispatcherId) const
+{
+    const auto found = m_dispatchers.find(normalised(dispatcherId));
+    return found == m_dispatchers.end() ? nullptr : found->second;
+}
+
+void MarloModel::addStore(const std::string& dispatcherId, const QString& path)
+{
+    const std::string id = normalised(dispatcherId);
+    m_dispatchers[id] = std::make_shared<StoreDispatcher>(id, path, m_options);
+}
+
+void MarloModel::setCommandDispatcher(const std::string& dispatcherId, std::shared_ptr<CommandDispatcher> dispatcher)
+{
+    m_dispatchers[normalised(dispatcherId)] = std::move(dispatcher);
+}
+
+std::string MarloModel::normalised(const std::string& dispatcherId)
+{
+    return dispatcherId.empty() ? defaultDispatcherId() : dispatcherId;
+}
+
+} // namespace vemi

@@ -1,0 +1,26 @@
+#pragma once
+
+#include "Command.h"
+#include "DirFolder.h"
+
+namespace vemi {
+
+// Moves a folder or an entry into another folder ("" = top level).
+class MoveDirItem : public Command
+{
+public:
+    MoveDirItem(DirItemKind kind, std::string id, std::string targetFolderId)
+        : m_kind(kind), m_id(std::move(id)), m_targetFolderId(std::move(targetFolderId)) {}
+
+    std::shared_ptr<Response> execute(StoreDatabase& database) override;
+    std::string description() const override { return "move the item"; }
+
+private:
+    void moveFolder(StoreDatabase& database);
+
+    DirItemKind m_kind;
+    std::string m_id;
+    std::string m_targetFolderId;
+};
+
+} // namespace vemi

@@ -1,0 +1,52 @@
+#include "RenameDirItem.h"
+
+#include "BaseObject.h"
+#include "DirectoryQueries.h"
+#include "Header.h"
+#include "ObjectCodec.h"
+#include "Response.h"
+#include "StoreDatabase.h"
+#include "StoreError.h"
+
+namespace vemi {
+
+std::shared_ptr<Response> RenameDirItem::execute(StoreDatabase& database)
+{
+    if (m_name.empty())
+        throw StoreError("the name is empty");
+    database.writeTransaction([&] {
+        if (m_kind == DirItemKind::Folder)
+            renameFolder(database);
+        else
+            renameEntry(database);
+    });
+    return std::make_shared<Response>();
+}
+
+void RenameDirItem::renameFolder(StoreDatabase& database)
+{
+    QSqlQuery folder = database.run(QStringLiteral("SELECT object_type, parent_id FROM folders WHERE id = ?"),
+                                    {QString::fromStdString(m_id)}, "rename the folder");
+    if (!folder.next())
+        throw StoreError("the folder no longer exists");
+    DirectoryQueries(database).requireFreeFolderName(folder.value(0).toString().toStdString(),
+                                                     folder.value(1).toString().toStdString(), m_name, m_id);
+    database.run(QStringLiteral("UPDATE folders SET name = ? WHERE id = ?"),
+                 {QString::fromStdString(m_name), QString::fromStdString(m_id)}, "rename the folder");
+}
+
+void RenameDirItem::renameEntry(StoreDatabase& database)
+{
+    QSqlQuery stored = database.run(QStringLiteral("SELECT o.id, o.data FROM dir_entries e"
+                                                   " JOIN objects o ON o.id = e.object_id WHERE e.id = ?"),
+                                    {QString::fromStdString(m_id)}, "rename the object");
+    if (!stored.next())
+        throw StoreError("the entry no longer exists");
+    const QString objectId = stored.value(0).toString();
+    auto object = ObjectCodec::deserialize(stored.value(1).toByteArray());
+    object->header()->setName(m_name);
+    database.run(QStringLiteral("UPDATE objects SET name = ?, data = ? WHERE id = ?"),
+                 {QString::fromStdString(m_name), ObjectCodec::serialize(*object), objectId}, "rename the object");
+}
+
+} // namespace vemi

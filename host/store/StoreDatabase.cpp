@@ -1,0 +1,188 @@
+#include "StoreDatabase.h"
+
+#include "StoreError.h"
+
+#include <QSqlDatabase>
+#include <QSqlError>
+#include <QStringList>
+
+#include <atomic>
+
+namespace vemi {
+
+namespace {
+
+// Each entry upgrades the schema by one version; entry 0 creates version 1.
+const std::vector<QStringList>& migrations()
+{
+    static const std::vector<QStringList> steps = {
+        {
+            QStringLiteral("CREATE TABLE folders("
+                           " id TEXT PRIMARY KEY,"
+                           " object_type TEXT NOT NULL,"
+                           " parent_id TEXT REFERENCES folders(id) ON DELETE CASCADE,"
+                           " name TEXT NOT NULL)"),
+            QStringLiteral("CREATE INDEX folders_by_type ON folders(object_type)"),
+            QStringLiteral("CREATE TABLE objects("
+                           " id TEXT PRIMARY KEY,"
+                           " type TEXT NOT NULL,"
+                           " name TEXT NOT NULL,"
+                           " data BLOB NOT NULL)"),
+            QStringLiteral("CREATE INDEX objects_by_type ON objects(type, name)"),
+            QStringLiteral("CREATE TABLE dir_entries("
+                           " id TEXT PRIMARY KEY,"
+                           " object_id TEXT NOT NULL UNIQUE REFERENCES objects(id) ON DELETE CASCADE,"
+                           " folder_id TEXT REFERENCES folders(id) ON DELETE CASCADE)"),
+            QStringLiteral("CREATE INDEX dir_entries_by_folder ON dir_entries(folder_id)"),
+        },
+    };
+    return steps;
+}
+
+QString uniqueConnectionName()
+{
+    static std::atomic<int> counter{0};
+    return QStringLiteral("vemi-store-%1").arg(++counter);
+}
+
+QString primaryCause(int code)
+{
+    switch (code & 0xFF) {
+    case 5: return QStringLiteral("the store is locked by another program");
+    case 8: return QStringLiteral("database is read-only");
+    case 13: return QStringLiteral("the disk is full");
+    case 14: return QStringLiteral("the file cannot be opened");
+    case 26: return QStringLiteral("the file is not a store");
+    default: return {};
+    }
+}
+
+} // namespace
+
+StoreDatabase::StoreDatabase(QString path, StoreOptions options)
+    : m_path(std::move(path)), m_options(options), m_connectionName(uniqueConnectionName())
+{
+}
+
+StoreDatabase::~StoreDatabase()
+{
+    {
+        QSqlDatabase database = QSqlDatabase::database(m_connectionName, false);
+        if (database.isValid())
+            database.close();
+    }
+    QSqlDatabase::removeDatabase(m_connectionName);
+}
+
+int StoreDatabase::schemaVersion()
+{
+    return int(migrations().size());
+}
+
+void StoreDatabase::open()
+{
+    QSqlDatabase database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_connectionName);
+    if (!database.isValid())
+        throw StoreError("the SQLite driver for Qt is not installed (package libqt5sql5-sqlite)");
+    database.setDatabaseName(m_path);
+    QString connectOptions = QStringLiteral("QSQLITE_BUSY_TIMEOUT=%1").arg(m_options.busyTimeoutMs);
+    if (m_options.readOnly)
+        connectOptions += QStringLiteral(";QSQLITE_OPEN_READONLY");
+    database.setConnectOptions(connectOptions);
+    if (!database.open())
+        throw StoreError(describe(database.lastError(), "open the store").toStdString());
+
+    checkOwnership(readPragma("application_id"), readPragma("user_version"),
+                   scalar(QStringLiteral("SELECT count(*) FROM sqlite_master"), {}, "open the store").toInt());
+    applyPragmas();
+    m_open = true;
+}
+
+int StoreDatabase::readPragma(const char* name)
+{
+    return scalar(QStringLiteral("PRAGMA %1").arg(QLatin1String(name)), {}, "open the store").toInt();
+}
+
+void StoreDatabase::checkOwnership(int applicationId, int version, int tableCount)
+{
+    const bool fresh = applicationId == 0 && version == 0 && tableCount == 0;
+    if (!fresh && applicationId != kApplicationId)
+        throw StoreError("cannot open the store " + m_path.toStdString()
+                         + ": the file is another program's SQLite database, not a store");
+    if (version > schemaVersion())
+        throw StoreError("cannot open the store " + m_path.toStdString() + ": it was written by a newer version"
+                         + " (schema " + std::to_string(version) + ", this program knows "
+                         + std::to_string(schemaVersion()) + ")");
+    if (version < schemaVersion()) {
+        if (m_options.readOnly)
+            throw StoreError("cannot open the store " + m_path.toStdString()
+                             + " read-only: it must first be created or upgraded");
+        migrate(version);
+    }
+}
+
+void StoreDatabase::migrate(int fromVersion)
+{
+    writeTransaction([&] {
+        for (int version = fromVersion; version < schemaVersion(); ++version) {
+            for (const QString& statement : migrations()[size_t(version)])
+                run(statement, {}, "upgrade the store");
+        }
+        run(QStringLiteral("PRAGMA application_id = %1").arg(kApplicationId), {}, "upgrade the store");
+        run(QStringLiteral("PRAGMA user_version = %1").arg(schemaVersion()), {}, "upgrade the store");
+    });
+}
+
+void StoreDatabase::applyPragmas()
+{
+    run(QStringLiteral("PRAGMA foreign_keys = ON"), {}, "open the store");
+    if (m_options.readOnly)
+        return;
+    run(QStringLiteral("PRAGMA journal_mode = WAL"), {}, "open the store");
+    run(QStringLiteral("PRAGMA synchronous = NORMAL"), {}, "open the store");
+}
+
+QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings, const char* operation)
+{
+    QSqlQuery query(QSqlDatabase::database(m_connectionName, false));
+    query.setForwardOnly(true);
+    if (!query.prepare(sql))
+        throw StoreError(describe(query.lastError(), operation).toStdString());
+    for (const QVariant& value : bindings)
+        query.addBindValue(value);
+    if (!query.exec())
+        throw StoreError(describe(query.lastError(), operation).toStdString());
+    return query;
+}
+
+QVariant StoreDatabase::scalar(const QString& sql, const QVariantList& bindings, const char* operation)
+{
+    QSqlQuery query = run(sql, bindings, operation);
+    return query.next() ? query.value(0) : QVariant();
+}
+
+void StoreDatabase::writeTransaction(const std::function<void()>& body)
+{
+    run(QStringLiteral("BEGIN IMMEDIATE"), {}, "start writing to the store");
+    try {
+        body();
+        run(QStringLiteral("COMMIT"), {}, "finish writing to the store");
+    } catch (...) {
+        QSqlQuery rollback(QSqlDatabase::database(m_connectionName, false));
+        rollback.exec(QStringLiteral("ROLLBACK"));
+        throw;
+    }
+}
+
+QString StoreDatabase::describe(const QSqlError& error, const char* operation) const
+{
+    const QString cause = primaryCause(error.nativeErrorCode().toInt());
+    const QString detail = error.databaseText().isEmpty() ? error.text() : error.databaseText();
+    QString message = cause.isEmpty() ? detail : cause + QStringLiteral(" (") + detail + QLatin1Char(')');
+    message += QStringLiteral(": ") + m_path;
+    if (operation)
+        message = QStringLiteral("Cannot %1: ").arg(QLatin1String(operation)) + message;
+    return message;
+}
+
+} // namespace vemi

@@ -1,0 +1,59 @@
+#pragma once
+
+#include "StoreOptions.h"
+
+#include <QSqlQuery>
+#include <QString>
+#include <QVariantList>
+
+#include <functional>
+
+class QSqlError;
+
+namespace vemi {
+
+// One SQLite connection to a store file. Created, used and destroyed on one
+// thread (a dispatcher's worker). Every failure is thrown as a StoreError whose
+// message names the operation, the file and the cause.
+class StoreDatabase
+{
+public:
+    // Marks the file as ours ("QCJT") so that a foreign SQLite file is refused.
+    static constexpr int kApplicationId = 0x51434A54;
+
+    StoreDatabase(QString path, StoreOptions options);
+    StoreDatabase(const StoreDatabase&) = delete;
+    StoreDatabase& operator=(const StoreDatabase&) = delete;
+    ~StoreDatabase();
+
+    QString path() const { return m_path; }
+    bool isOpen() const { return m_open; }
+    static int schemaVersion();
+
+    // Opens the file, refuses one that is not a store, creates or migrates the
+    // schema. Nothing is written to a file that fails the checks.
+    void open();
+
+    // Runs one statement with positional bindings, positioned before its first
+    // row; throws StoreError.
+    QSqlQuery run(const QString& sql, const QVariantList& bindings = {}, const char* operation = nullptr);
+    // The first column of the first row, or an invalid QVariant when there is none.
+    QVariant scalar(const QString& sql, const QVariantList& bindings = {}, const char* operation = nullptr);
+    // Runs body inside BEGIN IMMEDIATE … COMMIT; rolls back and rethrows on failure.
+    void writeTransaction(const std::function<void()>& body);
+
+    QString describe(const QSqlError& error, const char* operation) const;
+
+private:
+    void checkOwnership(int applicationId, int version, int tableCount);
+    void migrate(int fromVersion);
+    void applyPragmas();
+    int readPragma(const char* name);
+
+    QString m_path;
+    StoreOptions m_options;
+    QString m_connectionName;
+    bool m_open = false;
+};
+
+} // namespace vemi

@@ -1,0 +1,37 @@
+#pragma once
+
+#include "StoreOptions.h"
+
+#include <QObject>
+#include <QString>
+
+#include <memory>
+
+namespace vemi {
+
+class QtCommand;
+class StoreDatabase;
+
+// Lives on a dispatcher's worker thread and owns that thread's connection,
+// which it opens with the first command (and again after a failed open).
+class StoreWorker : public QObject
+{
+    Q_OBJECT
+
+public:
+    StoreWorker(QString path, StoreOptions options);
+    ~StoreWorker() override;
+
+    // Runs one command and posts its answer to the wrapper's thread.
+    void run(std::shared_ptr<QtCommand> command);
+    // Opens the connection if needed; returns the error text, empty on success.
+    QString ensureOpen();
+    void close();
+
+private:
+    QString m_path;
+    StoreOptions m_options;
+    std::unique_ptr<StoreDatabase> m_database;
+};
+
+} // namespace vemi

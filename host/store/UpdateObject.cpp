@@ -1,0 +1,83 @@
+#include "UpdateObject.h"
+
+#include "BaseObject.h"
+#include "DirEntry.h"
+#include "Header.h"
+#include "ObjectCodec.h"
+#include "StoreDatabase.h"
+#include "StoreError.h"
+#include "UpdateObjectResponse.h"
+
+#include <QUuid>
+
+namespace vemi {
+
+namespace {
+
+QVariant folderValue(const std::string& folderId)
+{
+    return folderId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(folderId));
+}
+
+} // namespace
+
+void UpdateObject::prepare()
+{
+    if (!m_object)
+        return;
+    m_data = ObjectCodec::serialize(*m_object);
+    m_id = m_object->id();
+    m_type = m_object->objectTypeId();
+    m_name = m_object->header() ? m_object->header()->name() : std::string();
+}
+
+std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
+{
+    if (m_data.isEmpty())
+        throw StoreError("there is no object to save");
+    std::shared_ptr<DirEntry> entry;
+    database.writeTransaction([&] {
+        database.run(QStringLiteral("INSERT INTO objects(id, type, name, data) VALUES(?, ?, ?, ?)"
+                                    " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
+                                    " name = excluded.name, data = excluded.data"),
+                     {QString::fromStdString(m_id), QString::fromStdString(m_type),
+                      QString::fromStdString(m_name), m_data},
+                     "save the object");
+        if (m_folderId)
+            entry = fileInFolder(database);
+    });
+    return std::make_shared<UpdateObjectResponse>(m_id, entry);
+}
+
+std::shared_ptr<DirEntry> UpdateObject::fileInFolder(StoreDatabase& database)
+{
+    QVariant entryId = database.scalar(QStringLiteral("SELECT id FROM dir_entries WHERE object_id = ?"),
+                                       {QString::fromStdString(m_id)}, "file the object");
+    std::string folderId = *m_folderId;
+    if (entryId.isValid()) {
+        folderId = database.scalar(QStringLiteral("SELECT folder_id FROM dir_entries WHERE id = ?"),
+                                   {entryId}, "file the object").toString().toStdString();
+    } else {
+        if (!folderId.empty()
+            && !database.scalar(QStringLiteral("SELECT 1 FROM folders WHERE id = ?"),
+                                {QString::fromStdString(folderId)}, "file the object").isValid())
+            throw StoreError("the folder it belongs in was deleted");
+        entryId = QUuid::createUuid().toString(QUuid::WithoutBraces);
+        database.run(QStringLiteral("INSERT INTO dir_entries(id, object_id, folder_id) VALUES(?, ?, ?)"),
+                     {entryId, QString::fromStdString(m_id), folderValue(folderId)}, "file the object");
+    }
+    auto entry = std::make_shared<DirEntry>();
+    entry->setId(entryId.toString().toStdString());
+    entry->setEntryObjectId(m_id);
+    entry->setEntryObjectType(m_type);
+    entry->setFolderId(folderId);
+    entry->header()->setName(m_name);
+    return entry;
+}
+
+std::string UpdateObject::description() const
+{
+    return m_name.empty() ? "save the object " + m_id : "save \"" + m_name + "\"";
+}
+
+} // namespace vemi

@@ -1,0 +1,40 @@
+#pragma once
+
+#include "Command.h"
+
+#include <QByteArray>
+
+#include <optional>
+
+namespace vemi {
+
+class BaseObject;
+class DirEntry;
+
+// Stores an object: creates it or replaces the stored one with the same id.
+// The object is serialised when the command is dispatched; later edits of
+// the object are not part of this write.
+class UpdateObject : public Command
+{
+public:
+    void setObject(std::shared_ptr<BaseObject> object) { m_object = std::move(object); }
+    std::shared_ptr<BaseObject> object() const { return m_object; }
+    // Files an object that has no folder entry yet in this folder ("" = top level).
+    void setFolderId(const std::string& folderId) { m_folderId = folderId; }
+
+    void prepare() override;
+    std::shared_ptr<Response> execute(StoreDatabase& database) override;
+    std::string description() const override;
+
+private:
+    std::shared_ptr<DirEntry> fileInFolder(StoreDatabase& database);
+
+    std::shared_ptr<BaseObject> m_object;
+    std::optional<std::string> m_folderId;
+    QByteArray m_data;
+    std::string m_id;
+    std::string m_type;
+    std::string m_name;
+};
+
+} // namespace vemi

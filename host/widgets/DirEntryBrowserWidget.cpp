@@ -1,0 +1,442 @@
+#include "DirEntryBrowserWidget.h"
+
+#include "DirEntry.h"
+#include "DirEntryBrowserInterface.h"
+#include "DirEntryTreeModel.h"
+#include "NamedObject.h"
+
+#include <QAction>
+#include <QEventLoop>
+#include <QHeaderView>
+#include <QInputDialog>
+#include <QLabel>
+#include <QMenu>
+#include <QMessageBox>
+#include <QSettings>
+#include <QTreeView>
+#include <QVBoxLayout>
+
+#include <algorithm>
+
+namespace vemi {
+
+using Node = BaseObjectTreeModel::Node;
+using DirEntryNode = DirEntryTreeModel::DirEntryNode;
+
+DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
+    : QWidget(parent), m_title(new QLabel(this)), m_tree(new QTreeView(this))
+{
+    QFont titleFont = m_title->font();
+    titleFont.setBold(true);
+    m_title->setFont(titleFont);
+    m_tree->setHeaderHidden(true);
+    m_tree->setContextMenuPolicy(Qt::CustomContextMenu);
+    connect(m_tree, &QWidget::customContextMenuRequested, this, &DirEntryBrowserWidget::showContextMenu);
+
+    auto* layout = new QVBoxLayout(this);
+    layout->setContentsMargins(4, 4, 4, 4);
+    layout->addWidget(m_title);
+    layout->addWidget(m_tree);
+    createActions();
+}
+
+DirEntryBrowserWidget::~DirEntryBrowserWidget()
+{
+    if (m_callbacks)
+        m_callbacks->m_browserWidget = nullptr;
+}
+
+void DirEntryBrowserWidget::createActions()
+{
+    const auto make = [this](const QString& text, QKeySequence shortcut, void (DirEntryBrowserWidget::*slot)()) {
+        auto* action = new QAction(text, this);
+        action->setShortcut(shortcut);
+        connect(action, &QAction::triggered, this, slot);
+        return action;
+    };
+    m_actionNew = make(tr("New"), QKeySequence::New, &DirEntryBrowserWidget::createNewObject);
+    m_actionOpen = make(tr("Open…"), QKeySequence::Open, &DirEntryBrowserWidget::openObject);
+    m_actionSave = make(tr("Save"), QKeySequence::Save, &DirEntryBrowserWidget::saveCurrentObject);
+    m_actionNewFolder = make(tr("New Folder…"), {}, &DirEntryBrowserWidget::createFolder);
+    m_actionRename = make(tr("Rename…"), QKeySequence(Qt::Key_F2), &DirEntryBrowserWidget::renameCurrent);
+    m_actionMove = make(tr("Move To…"), {}, &DirEntryBrowserWidget::moveSelection);
+    m_actionDelete = make(tr("Delete"), QKeySequence::Delete, &DirEntryBrowserWidget::deleteSelection);
+    // The tree's own shortcuts must not fire while the user types elsewhere in the tab.
+    for (QAction* action : {m_actionRename, m_actionDelete}) {
+        action->setShortcutContext(Qt::WidgetShortcut);
+        m_tree->addAction(action);
+    }
+    updateActions();
+}
+
+void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowserInterface* callbacks,
+                                       const std::string& typeId, const QString& title, const QString& newText,
+                                       const std::string& settingsName, QItemSelectionModel* selectionModel,
+                                       bool singleSelection)
+{
+    m_model = model;
+    m_callbacks = callbacks;
+    if (m_callbacks)
+        m_callbacks->m_browserWidget = this;
+    m_plural = title;
+    m_title->setText(title);
+    m_actionNew->setText(newText);
+    m_settingsKey = QStringLiteral("Browser/%1/%2/lastSelection")
+                        .arg(QString::fromStdString(settingsName), QString::fromStdString(typeId));
+
+    m_model->setObjectType(typeId);
+    m_tree->setModel(m_model);
+    if (selectionModel)
+        m_tree->setSelectionModel(selectionModel);
+    m_tree->setSelectionMode(singleSelection ? QAbstractItemView::SingleSelection
+                                             : QAbstractItemView::ExtendedSelection);
+    connect(m_tree->selectionModel(), &QItemSelectionModel::selectionChanged, this,
+            &DirEntryBrowserWidget::onTreeSelectionChanged);
+    connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+
+    const std::string remembered = QSettings().value(m_settingsKey).toString().toStdString();
+    m_model->load([this, remembered](bool ok) {
+        if (ok)
+            restoreSelection({remembered});
+    });
+}
+
+void DirEntryBrowserWidget::createCustomMenus(QMenu* menu, const QString& singular, const QString& plural,
+                                              bool withFolderActions)
+{
+    m_singular = singular;
+    m_plural = plural;
+    m_actionOpen->setText(tr("Open %1…").arg(singular));
+    m_actionSave->setText(tr("Save %1").arg(singular));
+    menu->addAction(m_actionNew);
+    menu->addAction(m_actionOpen);
+    menu->addAction(m_actionSave);
+    if (!withFolderActions)
+        return;
+    menu->addSeparator();
+    menu->addAction(m_actionNewFolder);
+    menu->addAction(m_actionRename);
+    menu->addAction(m_actionMove);
+    menu->addAction(m_actionDelete);
+}
+
+void DirEntryBrowserWidget::showContextMenu(const QPoint& position)
+{
+    QMenu menu(this);
+    for (QAction* action : {m_actionNew, m_actionSave, m_actionNewFolder, m_actionRename, m_actionMove,
+                            m_actionDelete})
+        menu.addAction(action);
+    menu.exec(m_tree->viewport()->mapToGlobal(position));
+}
+
+QVector<Node*> DirEntryBrowserWidget::selectedNodes() const
+{
+    QVector<Node*> nodes;
+    if (!m_model)
+        return nodes;
+    for (const QModelIndex& index : m_tree->selectionModel()->selectedRows())
+        nodes.append(m_model->nodeFromIndex(index));
+    return nodes;
+}
+
+Node* DirEntryBrowserWidget::currentNode() const
+{
+    const QVector<Node*> nodes = selectedNodes();
+    return nodes.size() == 1 ? nodes.first() : nullptr;
+}
+
+void DirEntryBrowserWidget::selectNode(Node* node)
+{
+    const QModelIndex index = m_model->indexFromNode(node);
+    m_tree->expand(index.parent());
+    m_tree->selectionModel()->setCurrentIndex(index, QItemSelectionModel::ClearAndSelect);
+    m_tree->scrollTo(index);
+}
+
+void DirEntryBrowserWidget::onTreeSelectionChanged()
+{
+    const quint64 generation = ++m_selectionGeneration;
+    auto pending = std::make_shared<int>(1);
+    const auto finishOne = [this, pending, generation](bool) {
+        if (--*pending == 0)
+            emitSelection(generation);
+    };
+    for (Node* node : selectedNodes()) {
+        auto* entry = dynamic_cast<DirEntryNode*>(node);
+        if (entry && entry->isSaved() && !entry->object()) {
+            ++*pending;
+            m_model->loadObject(entry, finishOne);
+        }
+    }
+    finishOne(true);
+    updateActions();
+}
+
+void DirEntryBrowserWidget::emitSelection(quint64 generation)
+{
+    // A newer selection replaced this one while its objects were loading.
+    if (generation != m_selectionGeneration)
+        return;
+    rememberSelection();
+    updateActions();
+    emit sgSelectionChanged(selectedNodes());
+}
+
+std::string DirEntryBrowserWidget::keyOf(const Node* node) const
+{
+    if (const auto* folder = dynamic_cast<const DirEntryTreeModel::FolderNode*>(node))
+        return "folder:" + folder->folder().id;
+    const auto* entry = dynamic_cast<const DirEntryNode*>(node);
+    if (entry && entry->isSaved())
+        return "entry:" + entry->dirEntry()->id();
+    if (entry && entry->object())
+        return "object:" + entry->object()->id();
+    return {};
+}
+
+std::vector<std::string> DirEntryBrowserWidget::selectionKeys() const
+{
+    std::vector<std::string> keys;
+    for (Node* node : selectedNodes())
+        keys.push_back(keyOf(node));
+    return keys;
+}
+
+void DirEntryBrowserWidget::rememberSelection()
+{
+    Node* node = currentNode();
+    const auto* entry = dynamic_cast<const DirEntryNode*>(node);
+    if (entry && entry->isSaved())
+        QSettings().setValue(m_settingsKey, QString::fromStdString(keyOf(entry)));
+}
+
+void DirEntryBrowserWidget::restoreSelection(const std::vector<std::string>& keys)
+{
+    QItemSelection selection;
+    QModelIndex current;
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (std::find(keys.begin(), keys.end(), keyOf(node)) == keys.end())
+            continue;
+        const QModelIndex index = m_model->indexFromNode(node);
+        for (QModelIndex parent = index.parent(); parent.isValid(); parent = parent.parent())
+            m_tree->expand(parent);
+        selection.select(index, index);
+        current = index;
+    }
+    if (!current.isValid()) {
+        // A reset clears the selection without a signal: say that it is empty.
+        onTreeSelectionChanged();
+        return;
+    }
+    m_tree->selectionModel()->setCurrentIndex(current, QItemSelectionModel::NoUpdate);
+    m_tree->selectionModel()->select(selection, QItemSelectionModel::ClearAndSelect);
+    m_tree->scrollTo(current);
+}
+
+void DirEntryBrowserWidget::updateActions()
+{
+    const bool ready = m_model != nullptr;
+    Node* node = currentNode();
+    const QVector<Node*> nodes = selectedNodes();
+    m_actionNew->setEnabled(ready && m_callbacks);
+    m_actionOpen->setEnabled(ready);
+    m_actionSave->setEnabled(node && !node->isFolder() && node->isModified() && node->object());
+    m_actionNewFolder->setEnabled(ready);
+    m_actionRename->setEnabled(node != nullptr);
+    m_actionMove->setEnabled(!nodes.isEmpty());
+    m_actionDelete->setEnabled(!nodes.isEmpty());
+}
+
+void DirEntryBrowserWidget::showError(const QString& message)
+{
+    auto* box = new QMessageBox(QMessageBox::Warning, m_plural, message, QMessageBox::Ok, this);
+    box->setAttribute(Qt::WA_DeleteOnClose);
+    box->open();
+}
+
+void DirEntryBrowserWidget::namedObjectWasModified(std::shared_ptr<NamedObject> object)
+{
+    if (!m_model || !object)
+        return;
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (node->object() == object) {
+            node->setModified(true);
+            m_model->nodeChanged(node);
+        }
+    }
+    updateActions();
+}
+
+std::vector<std::string> DirEntryBrowserWidget::namesInNewObjectFolder() const
+{
+    const Node* folder = m_newObjectFolder ? m_model->findBySerial(m_newObjectFolder) : nullptr;
+    return m_model->namesIn(folder);
+}
+
+void DirEntryBrowserWidget::createNewObject()
+{
+    if (!m_model || !m_callbacks)
+        return;
+    Node* folder = m_model->folderFor(currentNode());
+    m_newObjectFolder = folder ? folder->serial() : 0;
+    std::shared_ptr<NamedObject> object = m_callbacks->newNamedObject();
+    if (!object)
+        return;
+    selectNode(m_model->addUnsavedObject(folder, object));
+}
+
+void DirEntryBrowserWidget::openObject()
+{
+    QStringList names;
+    std::vector<Node*> candidates;
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (node->isFolder())
+            continue;
+        QStringList path;
+        for (const std::string& folder : m_model->pathOf(node))
+            path << QString::fromStdString(folder);
+        path << node->displayName();
+        names << path.join(QLatin1Char('/'));
+        candidates.push_back(node);
+    }
+    if (candidates.empty()) {
+        showError(tr("There is nothing to open yet."));
+        return;
+    }
+    bool ok = false;
+    const QString chosen = QInputDialog::getItem(this, m_actionOpen->text(), m_plural, names, 0, false, &ok);
+    if (ok && names.contains(chosen))
+        selectNode(candidates[size_t(names.indexOf(chosen))]);
+}
+
+void DirEntryBrowserWidget::saveCurrentObject()
+{
+    auto* node = dynamic_cast<DirEntryNode*>(currentNode());
+    if (!node || !node->object() || !node->isModified())
+        return;
+    m_actionSave->setEnabled(false);
+    m_model->saveObject(node, [this](bool) { updateActions(); });
+}
+
+bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)
+{
+    // A local event loop keeps the window responsive while the store writes.
+    QEventLoop loop;
+    int pending = int(nodes.size());
+    bool allSaved = true;
+    for (Node* node : nodes) {
+        m_model->saveObject(static_cast<DirEntryNode*>(node), [&](bool ok) {
+            allSaved = allSaved && ok;
+            if (--pending == 0)
+                loop.quit();
+        });
+    }
+    if (pending > 0)
+        loop.exec();
+    updateActions();
+    return allSaved;
+}
+
+bool DirEntryBrowserWidget::mayClose()
+{
+    if (!m_model)
+        return true;
+    std::vector<Node*> unsaved;
+    QStringList names;
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (!node->isFolder() && node->isModified() && node->object()) {
+            unsaved.push_back(node);
+            names << QStringLiteral("  • ") + node->displayName();
+        }
+    }
+    if (unsaved.empty())
+        return true;
+    const QString label = unsaved.size() == 1 ? (m_singular.isEmpty() ? tr("object") : m_singular)
+                                              : (m_plural.isEmpty() ? tr("objects") : m_plural);
+    const auto answer = QMessageBox::question(
+        this, tr("Unsaved changes"),
+        tr("These %1 have unsaved changes. Save them before closing?\n\n%2")
+            .arg(label, names.join(QLatin1Char('\n'))),
+        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
+    if (answer == QMessageBox::Discard)
+        return true;
+    if (answer != QMessageBox::Save)
+        return false;
+    return saveAndWait(unsaved);
+}
+
+void DirEntryBrowserWidget::refresh()
+{
+    if (!m_model)
+        return;
+    const std::vector<std::string> keys = selectionKeys();
+    m_model->load([this, keys](bool ok) {
+        if (ok)
+            restoreSelection(keys);
+    });
+}
+
+void DirEntryBrowserWidget::createFolder()
+{
+    Node* parent = m_model->folderFor(currentNode());
+    const std::vector<std::string> taken = m_model->namesIn(parent);
+    QString suggestion = tr("New Folder");
+    for (int number = 2; std::find(taken.begin(), taken.end(), suggestion.toStdString()) != taken.end(); ++number)
+        suggestion = tr("New Folder %1").arg(number);
+    bool ok = false;
+    const QString name = QInputDialog::getText(this, tr("New Folder"), tr("Folder name:"), QLineEdit::Normal,
+                                               suggestion, &ok).trimmed();
+    if (ok && !name.isEmpty())
+        m_model->createFolder(parent, name.toStdString(), {});
+}
+
+void DirEntryBrowserWidget::renameCurrent()
+{
+    Node* node = currentNode();
+    if (!node)
+        return;
+    bool ok = false;
+    const QString name = QInputDialog::getText(this, tr("Rename"), tr("New name:"), QLineEdit::Normal,
+                                               node->displayName(), &ok).trimmed();
+    if (ok && !name.isEmpty() && name != node->displayName())
+        m_model->renameNode(node, name.toStdString(), {});
+}
+
+void DirEntryBrowserWidget::moveSelection()
+{
+    const QVector<Node*> nodes = selectedNodes();
+    QStringList paths{tr("(top level)")};
+    std::vector<Node*> folders{nullptr};
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (!node->isFolder())
+            continue;
+        QStringList path;
+        for (const std::string& name : m_model->pathOf(node))
+            path << QString::fromStdString(name);
+        paths << path.join(QLatin1Char('/'));
+        folders.push_back(node);
+    }
+    bool ok = false;
+    const QString chosen = QInputDialog::getItem(this, tr("Move To"), tr("Folder:"), paths, 0, false, &ok);
+    if (!ok || !paths.contains(chosen))
+        return;
+    Node* target = folders[size_t(paths.indexOf(chosen))];
+    for (Node* node : nodes)
+        m_model->moveNode(node, target, {});
+}
+
+void DirEntryBrowserWidget::deleteSelection()
+{
+    const QVector<Node*> nodes = selectedNodes();
+    if (nodes.isEmpty())
+        return;
+    const QString what = nodes.size() == 1 ? QStringLiteral("\"%1\"").arg(nodes.first()->displayName())
+                                           : tr("%1 items").arg(nodes.size());
+    if (QMessageBox::question(this, tr("Delete"),
+                              tr("Delete %1 with everything in it? This cannot be undone.").arg(what))
+        != QMessageBox::Yes)
+        return;
+    m_model->deleteNodes(std::vector<Node*>(nodes.begin(), nodes.end()), {});
+}
+
+} // namespace vemi

@@ -1,0 +1,113 @@
+#pragma once
+
+#include "BaseObjectTreeModel.h"
+
+#include <QVector>
+#include <QWidget>
+
+#include <memory>
+#include <string>
+#include <vector>
+
+class QAction;
+class QItemSelectionModel;
+class QLabel;
+class QMenu;
+class QTreeView;
+
+namespace vemi {
+
+class DirEntryBrowserInterface;
+class DirEntryTreeModel;
+class NamedObject;
+
+// A folder tree of stored objects of one type with the actions to create,
+// open and save them and to manage the folders. Selecting entries loads their
+// objects; an object reported modified is marked in the tree until it is saved.
+class DirEntryBrowserWidget : public QWidget
+{
+    Q_OBJECT
+
+public:
+    explicit DirEntryBrowserWidget(QWidget* parent = nullptr);
+    ~DirEntryBrowserWidget() override;
+
+    // model: the tree to show (not owned; it must outlive this widget);
+    // callbacks: the client's side (not owned); title: shown above the tree;
+    // newText: the text of the new action; settingsName: where the last
+    // selection is remembered; selectionModel: null for the view's own;
+    // singleSelection: false lets the user select several items.
+    void initialize(DirEntryTreeModel* model, DirEntryBrowserInterface* callbacks, const std::string& typeId,
+                    const QString& title, const QString& newText, const std::string& settingsName,
+                    QItemSelectionModel* selectionModel, bool singleSelection);
+
+    QAction* actionNew() const { return m_actionNew; }
+    QAction* actionOpen() const { return m_actionOpen; }
+    QAction* actionSave() const { return m_actionSave; }
+
+    // Adds new, open and save to menu, and the folder actions (new folder,
+    // rename, move, delete) when withFolderActions is set. The labels name one
+    // object and several in the actions' texts and the questions asked.
+    void createCustomMenus(QMenu* menu, const QString& singular, const QString& plural, bool withFolderActions);
+
+    // Reads the tree again from the store; unsaved work is kept.
+    void refresh();
+    // Asks Save / Discard / Cancel when objects are unsaved; true when the
+    // browser may close (everything saved or the user chose to discard).
+    bool mayClose();
+
+    DirEntryTreeModel* treeModel() const { return m_model; }
+    QTreeView* treeView() const { return m_tree; }
+    // Names already used in the folder that "new" files into.
+    std::vector<std::string> namesInNewObjectFolder() const;
+
+public slots:
+    void namedObjectWasModified(std::shared_ptr<vemi::NamedObject> object);
+
+signals:
+    // The selected nodes, each object entry with its object loaded.
+    void sgSelectionChanged(QVector<vemi::BaseObjectTreeModel::Node*> selectedNodes);
+
+private:
+    void createActions();
+    void onTreeSelectionChanged();
+    void emitSelection(quint64 generation);
+    void rememberSelection();
+    void restoreSelection(const std::vector<std::string>& keys);
+    std::vector<std::string> selectionKeys() const;
+    std::string keyOf(const BaseObjectTreeModel::Node* node) const;
+    QVector<BaseObjectTreeModel::Node*> selectedNodes() const;
+    BaseObjectTreeModel::Node* currentNode() const;
+    void selectNode(BaseObjectTreeModel::Node* node);
+    void updateActions();
+    void showError(const QString& message);
+    void showContextMenu(const QPoint& position);
+
+    void createNewObject();
+    void openObject();
+    void saveCurrentObject();
+    bool saveAndWait(const std::vector<BaseObjectTreeModel::Node*>& nodes);
+    void createFolder();
+    void renameCurrent();
+    void moveSelection();
+    void deleteSelection();
+
+    DirEntryTreeModel* m_model = nullptr;
+    DirEntryBrowserInterface* m_callbacks = nullptr;
+    QLabel* m_title;
+    QTreeView* m_tree;
+    QAction* m_actionNew = nullptr;
+    QAction* m_actionOpen = nullptr;
+    QAction* m_actionSave = nullptr;
+    QAction* m_actionNewFolder = nullptr;
+    QAction* m_actionRename = nullptr;
+    QAction* m_actionMove = nullptr;
+    QAction* m_actionDelete = nullptr;
+    QString m_singular;
+    QString m_plural;
+    QString m_settingsKey;
+    quint64 m_selectionGeneration = 0;
+    quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
+};
+
+} // namespace vemi

@@ -1,0 +1,311 @@
+#include "DirEntryTreeModel.h"
+
+#include "CommandDispatcher.h"
+#include "CreateFolder.h"
+#include "DeleteDirItems.h"
+#include "DirEntry.h"
+#include "DirectoryTreeResponse.h"
+#include "ErrorInfo.h"
+#include "FolderResponse.h"
+#include "GetDirectoryTree.h"
+#include "GetMarloObject.h"
+#include "GetMarloObjectResponse.h"
+#include "Header.h"
+#include "ImageRepository.h"
+#include "MarloModel.h"
+#include "MoveDirItem.h"
+#include "NamedObject.h"
+#include "QtCommand.h"
+#include "RenameDirItem.h"
+#include "UpdateObject.h"
+#include "UpdateObjectResponse.h"
+
+#include <QIcon>
+
+#include <map>
+
+namespace vemi {
+
+DirEntryTreeModel::DirEntryNode::DirEntryNode(std::shared_ptr<DirEntry> entry, std::string folderId)
+    : m_entry(std::move(entry)), m_folderId(std::move(folderId))
+{
+}
+
+QString DirEntryTreeModel::DirEntryNode::displayName() const
+{
+    if (object())
+        return Node::displayName();
+    return m_entry ? QString::fromStdString(m_entry->header()->name()) : QString();
+}
+
+DirEntryTreeModel::DirEntryTreeModel(MarloModel& store, QObject* parent)
+    : BaseObjectTreeModel(parent), m_store(store)
+{
+}
+
+void DirEntryTreeModel::run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done)
+{
+    const auto dispatcher = m_store.commandDispatcher(m_dispatcherId);
+    if (!dispatcher) {
+        emit sgErrorOccurred(tr("There is no store named \"%1\".").arg(QString::fromStdString(m_dispatcherId)));
+        if (done)
+            done(false);
+        return;
+    }
+    auto wrapper = std::make_shared<QtCommand>(std::move(command));
+    connect(wrapper.get(), &QtCommand::responseReceived, this, [onResponse, done](std::shared_ptr<Response> response) {
+        onResponse(response);
+        if (done)
+            done(true);
+    });
+    connect(wrapper.get(), &QtCommand::errorReceived, this, [this, done](std::shared_ptr<ErrorInfo> error) {
+        emit sgErrorOccurred(error->message());
+        if (done)
+            done(false);
+    });
+    dispatcher->dispatch(wrapper);
+}
+
+std::string DirEntryTreeModel::folderIdOf(const Node* folder)
+{
+    const auto* folderNode = dynamic_cast<const FolderNode*>(folder);
+    return folderNode ? folderNode->folder().id : std::string();
+}
+
+void DirEntryTreeModel::load(const Done& done)
+{
+    run(std::make_shared<GetDirectoryTree>(m_objectType),
+        [this](const std::shared_ptr<Response>& response) { rebuild(response); }, done);
+}
+
+void DirEntryTreeModel::rebuild(const std::shared_ptr<Response>& response)
+{
+    const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response);
+    if (!tree)
+        return;
+    auto newRoot = std::make_unique<Node>();
+    std::map<std::string, std::unique_ptr<FolderNode>> pending;
+    std::map<std::string, Node*> folders{{std::string(), newRoot.get()}};
+    for (const DirFolder& folder : tree->folders()) {
+        auto node = std::make_unique<FolderNode>(folder);
+        folders[folder.id] = node.get();
+        pending[folder.id] = std::move(node);
+    }
+    const auto folderOrTop = [&folders, &newRoot](const std::string& id) {
+        const auto found = folders.find(id);
+        return found == folders.end() ? newRoot.get() : found->second;
+    };
+    for (auto& [id, node] : pending) {
+        Node* parent = folderOrTop(node->folder().parentId);
+        adopt(parent == node.get() ? newRoot.get() : parent, std::move(node));
+    }
+
+    // Objects already loaded here keep their (possibly unsaved) state.
+    std::map<std::string, DirEntryNode*> loaded;
+    for (Node* node : descendants(root())) {
+        auto* entryNode = dynamic_cast<DirEntryNode*>(node);
+        if (!entryNode || !entryNode->object())
+            continue;
+        if (entryNode->isSaved()) {
+            loaded[entryNode->dirEntry()->id()] = entryNode;
+        } else {
+            auto copy = std::make_unique<DirEntryNode>(nullptr, entryNode->folderId());
+            copy->setObject(entryNode->object());
+            copy->setModified(true);
+            adopt(folderOrTop(entryNode->folderId()), std::move(copy));
+        }
+    }
+    for (const auto& entry : tree->entries()) {
+        auto node = std::make_unique<DirEntryNode>(entry, entry->folderId());
+        const auto previous = loaded.find(entry->id());
+        if (previous != loaded.end()) {
+            node->setObject(previous->second->object());
+            node->setModified(previous->second->isModified());
+        }
+        adopt(folderOrTop(entry->folderId()), std::move(node));
+    }
+    sortRecursively(newRoot.get());
+    resetTree(std::move(newRoot));
+}
+
+DirEntryTreeModel::FolderNode* DirEntryTreeModel::folderFor(Node* node) const
+{
+    for (Node* current = node; current && current != root(); current = current->parent()) {
+        if (auto* folder = dynamic_cast<FolderNode*>(current))
+            return folder;
+    }
+    return nullptr;
+}
+
+std::vector<std::string> DirEntryTreeModel::namesIn(const Node* folder) const
+{
+    std::vector<std::string> names;
+    for (const auto& child : (folder ? folder : root())->children())
+        names.push_back(child->displayName().toStdString());
+    return names;
+}
+
+std::vector<std::string> DirEntryTreeModel::pathOf(const Node* node) const
+{
+    std::vector<std::string> path;
+    for (const Node* current = node; current && current != root(); current = current->parent()) {
+        if (const auto* folder = dynamic_cast<const FolderNode*>(current))
+            path.insert(path.begin(), folder->folder().name);
+    }
+    return path;
+}
+
+DirEntryTreeModel::DirEntryNode* DirEntryTreeModel::addUnsavedObject(Node* folder, std::shared_ptr<NamedObject> object)
+{
+    auto node = std::make_unique<DirEntryNode>(nullptr, folderIdOf(folder));
+    node->setObject(std::move(object));
+    node->setModified(true);
+    return static_cast<DirEntryNode*>(insertNode(folder ? folder : root(), std::move(node)));
+}
+
+void DirEntryTreeModel::loadObject(DirEntryNode* node, const Done& done)
+{
+    auto command = std::make_shared<GetMarloObject>();
+    command->setType(node->dirEntry()->entryObjectType());
+    command->setId(node->dirEntry()->entryObjectId());
+    const quint64 serial = node->serial();
+    run(command, [this, serial](const std::shared_ptr<Response>& response) {
+        const auto answer = std::dynamic_pointer_cast<GetMarloObjectResponse>(response);
+        auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+        if (!answer || !target || target->object())
+            return; // gone, or loaded (and maybe edited) meanwhile
+        target->setObject(std::dynamic_pointer_cast<NamedObject>(answer->object()));
+        nodeChanged(target);
+    }, done);
+}
+
+void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)
+{
+    auto command = std::make_shared<UpdateObject>();
+    command->setObject(node->object());
+    if (!node->isSaved())
+        command->setFolderId(node->folderId());
+    const quint64 serial = node->serial();
+    const quint64 revision = node->revision();
+    run(command, [this, serial, revision](const std::shared_ptr<Response>& response) {
+        auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+        if (!target)
+            return;
+        const auto answer = std::dynamic_pointer_cast<UpdateObjectResponse>(response);
+        if (answer && answer->entry() && !target->isSaved())
+            target->setDirEntry(answer->entry());
+        if (target->isSaved())
+            target->dirEntry()->header()->setName(target->object()->name());
+        // An edit made while the save ran is not in the store yet.
+        if (target->revision() == revision)
+            target->setModified(false);
+        nodeChanged(target);
+        if (target->isSaved()) {
+            auto entry = target->dirEntry();
+            emit sgItemChanged(entry);
+        }
+    }, done);
+}
+
+void DirEntryTreeModel::createFolder(Node* parentFolder, const std::string& name, const Done& done)
+{
+    const quint64 parentSerial = parentFolder ? parentFolder->serial() : 0;
+    run(std::make_shared<CreateFolder>(m_objectType, folderIdOf(parentFolder), name),
+        [this, parentSerial](const std::shared_ptr<Response>& response) {
+            const auto answer = std::dynamic_pointer_cast<FolderResponse>(response);
+            Node* parent = parentSerial ? findBySerial(parentSerial) : root();
+            if (answer && parent)
+                insertNode(parent, std::make_unique<FolderNode>(answer->folder()));
+        }, done);
+}
+
+void DirEntryTreeModel::renameNode(Node* node, const std::string& name, const Done& done)
+{
+    auto* entryNode = dynamic_cast<DirEntryNode*>(node);
+    if (entryNode && !entryNode->isSaved()) {
+        entryNode->object()->setName(name);
+        entryNode->setModified(true);
+        nodeChanged(entryNode);
+        if (done)
+            done(true);
+        return;
+    }
+    const bool isFolder = node->isFolder();
+    const std::string id = isFolder ? folderIdOf(node) : entryNode->dirEntry()->id();
+    const quint64 serial = node->serial();
+    run(std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name),
+        [this, serial, name](const std::shared_ptr<Response>&) {
+            Node* target = findBySerial(serial);
+            if (auto* folder = dynamic_cast<FolderNode*>(target))
+                folder->setName(name);
+            if (auto* entry = dynamic_cast<DirEntryNode*>(target)) {
+                entry->dirEntry()->header()->setName(name);
+                if (entry->object())
+                    entry->object()->setName(name);
+                auto changed = entry->dirEntry();
+                emit sgItemChanged(changed);
+            }
+            if (target)
+                nodeChanged(target);
+        }, done);
+}
+
+void DirEntryTreeModel::moveNode(Node* node, Node* targetFolder, const Done& done)
+{
+    const std::string targetId = folderIdOf(targetFolder);
+    const quint64 serial = node->serial();
+    const quint64 targetSerial = targetFolder ? targetFolder->serial() : 0;
+    const auto relocate = [this, serial, targetSerial, targetId]() {
+        Node* moving = findBySerial(serial);
+        Node* target = targetSerial ? findBySerial(targetSerial) : root();
+        if (!moving || !target)
+            return;
+        if (auto* entry = dynamic_cast<DirEntryNode*>(moving)) {
+            entry->setFolderId(targetId);
+            if (entry->dirEntry())
+                entry->dirEntry()->setFolderId(targetId);
+        }
+        insertNode(target, takeNode(moving));
+    };
+    auto* entryNode = dynamic_cast<DirEntryNode*>(node);
+    if (entryNode && !entryNode->isSaved()) {
+        relocate();
+        if (done)
+            done(true);
+        return;
+    }
+    const bool isFolder = node->isFolder();
+    run(std::make_shared<MoveDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry,
+                                      isFolder ? folderIdOf(node) : entryNode->dirEntry()->id(), targetId),
+        [relocate](const std::shared_ptr<Response>&) { relocate(); }, done);
+}
+
+void DirEntryTreeModel::deleteNodes(const std::vector<Node*>& nodes, const Done& done)
+{
+    std::vector<std::string> folderIds;
+    std::vector<std::string> entryIds;
+    std::vector<quint64> serials;
+    for (Node* node : nodes) {
+        serials.push_back(node->serial());
+        if (node->isFolder())
+            folderIds.push_back(folderIdOf(node));
+        else if (auto* entry = dynamic_cast<DirEntryNode*>(node); entry && entry->isSaved())
+            entryIds.push_back(entry->dirEntry()->id());
+    }
+    run(std::make_shared<DeleteDirItems>(folderIds, entryIds),
+        [this, serials](const std::shared_ptr<Response>&) {
+            for (quint64 serial : serials) {
+                if (Node* node = findBySerial(serial))
+                    removeNode(node);
+            }
+        }, done);
+}
+
+QIcon DirEntryTreeModel::iconFor(const Node* node) const
+{
+    if (node->isFolder())
+        return ImageRepository::instance().folderIcon();
+    return ImageRepository::instance().iconForType(m_objectType);
+}
+
+} // namespace vemi

@@ -1,0 +1,101 @@
+#pragma once
+
+#include "BaseObjectTreeModel.h"
+#include "DirFolder.h"
+
+#include <functional>
+#include <memory>
+#include <string>
+
+namespace vemi {
+
+class Command;
+class DirEntry;
+class MarloModel;
+class Response;
+
+// The folder tree of one object type in a store, kept in step with the store
+// through its commands. Every change is asynchronous; its outcome arrives as
+// a callback on the GUI thread, and a failure also as sgErrorOccurred.
+class DirEntryTreeModel : public BaseObjectTreeModel
+{
+    Q_OBJECT
+
+public:
+    class FolderNode : public Node
+    {
+    public:
+        explicit FolderNode(DirFolder folder) : m_folder(std::move(folder)) {}
+        const DirFolder& folder() const { return m_folder; }
+        void setName(const std::string& name) { m_folder.name = name; }
+        QString displayName() const override { return QString::fromStdString(m_folder.name); }
+        bool isFolder() const override { return true; }
+
+    private:
+        DirFolder m_folder;
+    };
+
+    // An object of the tree: a stored entry, or an object created here and not
+    // saved yet (no entry, filed in folderId when it is saved).
+    class DirEntryNode : public Node
+    {
+    public:
+        DirEntryNode(std::shared_ptr<DirEntry> entry, std::string folderId);
+        std::shared_ptr<DirEntry> dirEntry() const { return m_entry; }
+        void setDirEntry(std::shared_ptr<DirEntry> entry) { m_entry = std::move(entry); }
+        bool isSaved() const { return m_entry != nullptr; }
+        std::string folderId() const { return m_folderId; }
+        void setFolderId(const std::string& folderId) { m_folderId = folderId; }
+        QString displayName() const override;
+
+    private:
+        std::shared_ptr<DirEntry> m_entry;
+        std::string m_folderId;
+    };
+
+    using Done = std::function<void(bool ok)>;
+
+    DirEntryTreeModel(MarloModel& store, QObject* parent = nullptr);
+
+    MarloModel& store() const { return m_store; }
+    std::string objectType() const { return m_objectType; }
+    void setObjectType(const std::string& typeId) { m_objectType = typeId; }
+    std::string dispatcherId() const { return m_dispatcherId; }
+    void setDispatcherId(const std::string& dispatcherId) { m_dispatcherId = dispatcherId; }
+
+    // Reads the tree from the store. Objects already loaded, changed or not
+    // yet saved stay as they are.
+    void load(const Done& done = {});
+    // The folder a new object goes into when node is current (null: top level).
+    FolderNode* folderFor(Node* node) const;
+    std::vector<std::string> namesIn(const Node* folder) const;
+    // Folder names from the top down to node's folder.
+    std::vector<std::string> pathOf(const Node* node) const;
+
+    DirEntryNode* addUnsavedObject(Node* folder, std::shared_ptr<NamedObject> object);
+    void loadObject(DirEntryNode* node, const Done& done);
+    void saveObject(DirEntryNode* node, const Done& done);
+    void createFolder(Node* parentFolder, const std::string& name, const Done& done);
+    void renameNode(Node* node, const std::string& name, const Done& done);
+    void moveNode(Node* node, Node* targetFolder, const Done& done);
+    void deleteNodes(const std::vector<Node*>& nodes, const Done& done);
+
+signals:
+    void sgErrorOccurred(QString message);
+    void sgItemChanged(std::shared_ptr<vemi::DirEntry>& entry);
+
+protected:
+    QIcon iconFor(const Node* node) const override;
+
+private:
+    using OnResponse = std::function<void(const std::shared_ptr<Response>&)>;
+    void run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done);
+    void rebuild(const std::shared_ptr<Response>& response);
+    static std::string folderIdOf(const Node* folder);
+
+    MarloModel& m_store;
+    std::string m_objectType;
+    std::string m_dispatcherId;
+};
+
+} // namespace vemi
