@@ -38,3 +38,7 @@ private:
 };
 
 } // namespace vemi
+
+#include <QObject>
+
+Q_DECLARE_INTERFACE(vemi::CommonSettings, "CommonSettings")

@@ -1,5 +1,7 @@
 #include "HostMetaTypes.h"
 
+#include "BaseObjectTreeModel.h"
+
 #include <QtGlobal>
 
 namespace {
@@ -12,6 +14,7 @@ void registerHostMetaTypes()
     qRegisterMetaType<std::shared_ptr<vemi::ErrorInfo>>("std::shared_ptr<vemi::ErrorInfo>");
     qRegisterMetaType<std::shared_ptr<vemi::Progress>>("std::shared_ptr<vemi::Progress>");
     qRegisterMetaType<std::shared_ptr<vemi::BaseObject>>("std::shared_ptr<vemi::BaseObject>");
+    qRegisterMetaType<QVector<vemi::BaseObjectTreeModel::Node*>>("QVector<vemi::BaseObjectTreeModel::Node*>");
 }
 
 } // namespace

@@ -95,3 +95,5 @@ private:
 };
 
 } // namespace vemi
+
+Q_DECLARE_METATYPE(vemi::BaseObjectTreeModel::Node*)

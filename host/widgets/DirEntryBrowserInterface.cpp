@@ -7,7 +7,11 @@
 
 namespace vemi {
 
-DirEntryBrowserInterface::~DirEntryBrowserInterface() = default;
+DirEntryBrowserInterface::~DirEntryBrowserInterface()
+{
+    if (m_browserWidget)
+        m_browserWidget->m_callbacks = nullptr;
+}
 
 std::string DirEntryBrowserInterface::defaultNamedObjectName(QString base)
 {

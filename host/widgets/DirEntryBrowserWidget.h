@@ -69,6 +69,7 @@ signals:
     void sgSelectionChanged(QVector<vemi::BaseObjectTreeModel::Node*> selectedNodes);
 
 private:
+    friend class DirEntryBrowserInterface;
     void createActions();
     void onTreeSelectionChanged();
     void emitSelection(quint64 generation);

@@ -1,0 +1,46 @@
+#include "ShellOptions.h"
+
+#include "MarloModel.h"
+
+#include <QCommandLineParser>
+#include <QCoreApplication>
+
+namespace vemi {
+
+ShellOptions ShellOptions::parse(const QStringList& arguments)
+{
+    QCommandLineParser parser;
+    parser.setApplicationDescription(QStringLiteral("Host shell of the QC job template editor."));
+    parser.addHelpOption();
+    const QCommandLineOption store(QStringLiteral("store"), QStringLiteral("Use the store file <file>."),
+                                   QStringLiteral("file"));
+    const QCommandLineOption plugins(QStringLiteral("plugins"),
+                                     QStringLiteral("Load the client plug-ins of folder <folder>."),
+                                     QStringLiteral("folder"));
+    const QCommandLineOption readOnly(QStringLiteral("read-only"), QStringLiteral("Open the store read-only."));
+    const QCommandLineOption noSamples(QStringLiteral("no-samples"),
+                                       QStringLiteral("Do not fill an empty store with samples."));
+    const QCommandLineOption screenshot(QStringLiteral("screenshot"),
+                                        QStringLiteral("Save a picture of the window to <png> and quit."),
+                                        QStringLiteral("png"));
+    parser.addOptions({store, plugins, readOnly, noSamples, screenshot});
+
+    ShellOptions options;
+    if (!parser.parse(arguments)) {
+        options.error = parser.errorText();
+        return options;
+    }
+    if (parser.isSet(QStringLiteral("help"))) {
+        options.error = parser.helpText();
+        return options;
+    }
+    options.storePath = parser.isSet(store) ? parser.value(store) : MarloModel::standardStorePath();
+    options.pluginFolder = parser.isSet(plugins) ? parser.value(plugins)
+                                                 : QCoreApplication::applicationDirPath() + QStringLiteral("/../plugins");
+    options.readOnly = parser.isSet(readOnly);
+    options.withSamples = !parser.isSet(noSamples) && !options.readOnly;
+    options.screenshotPath = parser.value(screenshot);
+    return options;
+}
+
+} // namespace vemi

@@ -1,0 +1,99 @@
+#include "ShellWindow.h"
+
+#include "AppWidget.h"
+#include "ClientInterface.h"
+#include "CorvoTopBar.h"
+#include "ImageRepository.h"
+
+#include <QCloseEvent>
+#include <QFile>
+#include <QStackedWidget>
+#include <QTabWidget>
+#include <QToolBar>
+
+namespace vemi {
+
+ShellWindow::ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Client>& clients, QWidget* parent)
+    : QMainWindow(parent), m_tabs(new QTabWidget(this)), m_topBars(new QStackedWidget(this))
+{
+    setWindowTitle(tr("QC Host"));
+    m_tabs->setDocumentMode(true);
+    setCentralWidget(m_tabs);
+    setMenuWidget(m_topBars);
+    for (const PluginCatalog::Client& client : clients)
+        addClient(store, client.client);
+    connect(m_tabs, &QTabWidget::currentChanged, this, &ShellWindow::onCurrentTabChanged);
+    onCurrentTabChanged(m_tabs->currentIndex());
+}
+
+void ShellWindow::addClient(MarloModel& store, ClientInterface* client)
+{
+    AppWidget* widget = client->createAppWidget(store, m_tabs);
+    widget->createContent();
+    auto* topBar = new CorvoTopBar(m_topBars);
+    widget->addMenus(topBar);
+    auto* toolBar = new QToolBar(client->clientTitle(), this);
+    toolBar->setObjectName(client->clientTitle());
+    toolBar->setMovable(false);
+    toolBar->setIconSize(QSize(24, 24));
+    widget->addToolBarActions(toolBar);
+    addToolBar(toolBar);
+    toolBar->hide();
+
+    widget->setStyleSheet(styleSheet(client->styleSheetName()));
+    m_topBars->addWidget(topBar);
+    m_tabs->addTab(widget, ImageRepository::instance().appIcon(client->clientTitle().toStdString()),
+                   client->clientTitle());
+    m_appWidgets.push_back(widget);
+    m_toolBars.push_back(toolBar);
+}
+
+QString ShellWindow::styleSheet(const QString& name)
+{
+    QFile file(QStringLiteral(":/StyleSheets/") + name);
+    if (name.isEmpty() || !file.open(QIODevice::ReadOnly))
+        return {};
+    return QString::fromUtf8(file.readAll());
+}
+
+AppWidget* ShellWindow::appWidget(int tab) const
+{
+    return tab >= 0 && tab < int(m_appWidgets.size()) ? m_appWidgets[size_t(tab)] : nullptr;
+}
+
+CorvoTopBar* ShellWindow::topBar(int tab) const
+{
+    return qobject_cast<CorvoTopBar*>(m_topBars->widget(tab));
+}
+
+QToolBar* ShellWindow::toolBar(int tab) const
+{
+    return tab >= 0 && tab < int(m_toolBars.size()) ? m_toolBars[size_t(tab)] : nullptr;
+}
+
+void ShellWindow::onCurrentTabChanged(int tab)
+{
+    if (AppWidget* previous = appWidget(m_currentTab)) {
+        previous->receivedFocus(false);
+        toolBar(m_currentTab)->hide();
+    }
+    m_currentTab = tab;
+    if (AppWidget* current = appWidget(tab)) {
+        m_topBars->setCurrentIndex(tab);
+        toolBar(tab)->show();
+        current->receivedFocus(true);
+    }
+}
+
+void ShellWindow::closeEvent(QCloseEvent* event)
+{
+    for (AppWidget* widget : m_appWidgets) {
+        if (!widget->mayClose()) {
+            event->ignore();
+            return;
+        }
+    }
+    event->accept();
+}
+
+} // namespace vemi

@@ -1,0 +1,48 @@
+#pragma once
+
+#include "PluginCatalog.h"
+
+#include <QMainWindow>
+
+#include <vector>
+
+class QStackedWidget;
+class QTabWidget;
+class QToolBar;
+
+namespace vemi {
+
+class AppWidget;
+class CorvoTopBar;
+class MarloModel;
+
+// The host's main window: one tab per client, with the client's top bar and
+// tool bar shown while its tab is current.
+class ShellWindow : public QMainWindow
+{
+    Q_OBJECT
+
+public:
+    ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Client>& clients, QWidget* parent = nullptr);
+
+    QTabWidget* tabs() const { return m_tabs; }
+    AppWidget* appWidget(int tab) const;
+    CorvoTopBar* topBar(int tab) const;
+    QToolBar* toolBar(int tab) const;
+
+protected:
+    void closeEvent(QCloseEvent* event) override;
+
+private:
+    void addClient(MarloModel& store, ClientInterface* client);
+    void onCurrentTabChanged(int tab);
+    static QString styleSheet(const QString& name);
+
+    QTabWidget* m_tabs;
+    QStackedWidget* m_topBars;
+    std::vector<AppWidget*> m_appWidgets;
+    std::vector<QToolBar*> m_toolBars;
+    int m_currentTab = -1;
+};
+
+} // namespace vemi

@@ -1,0 +1,57 @@
+#include "PellamAppWidget.h"
+
+#include "CorvoTopBar.h"
+#include "PellamWidget.h"
+
+#include <QAction>
+#include <QMenu>
+#include <QVBoxLayout>
+
+namespace vemi {
+
+PellamAppWidget::PellamAppWidget(std::shared_ptr<PellamSettings> settings,
+                                 std::shared_ptr<GeneralSettings> generalSettings, MarloModel& store,
+                                 QWidget* parent)
+    : AppWidget(parent)
+    , m_settings(std::move(settings))
+    , m_generalSettings(std::move(generalSettings))
+    , m_store(store)
+{
+}
+
+void PellamAppWidget::createContent()
+{
+    m_browser = new PellamWidget(m_settings, m_generalSettings, m_store, parentWidget());
+    auto* layout = new QVBoxLayout;
+    layout->addWidget(m_browser);
+    layout->setContentsMargins(0, 0, 0, 0);
+    setLayout(layout);
+}
+
+void PellamAppWidget::addMenus(CorvoTopBar* topBar)
+{
+    auto* menu = new QMenu(tr("File"));
+    m_browser->createCustomMenus(menu);
+    menu->addSeparator();
+    QAction* refreshAction = menu->addAction(tr("&Refresh"));
+    refreshAction->setShortcut(QKeySequence(QKeySequence::Refresh));
+    connect(refreshAction, &QAction::triggered, this, &AppWidget::refresh);
+    topBar->addMenu(menu);
+}
+
+void PellamAppWidget::addToolBarActions(QWidget* bar)
+{
+    m_browser->addBrowserActions(bar);
+}
+
+bool PellamAppWidget::mayClose()
+{
+    return m_browser->mayClose();
+}
+
+void PellamAppWidget::refresh()
+{
+    m_browser->refresh();
+}
+
+} // namespace vemi

@@ -1,0 +1,386 @@
+#include "SampleData.h"
+
+#include "AppearanceValues.h"
+#include "CheckPoint.h"
+#include "CheckPointCouple.h"
+#include "ColorStandardsLibrary.h"
+#include "CommandDispatcher.h"
+#include "CreateFolder.h"
+#include "DirEntry.h"
+#include "DirectoryTreeResponse.h"
+#include "ErrorInfo.h"
+#include "GetDirectoryTree.h"
+#include "GetMarloObjects.h"
+#include "GetMarloObjectsResponse.h"
+#include "LabValue.h"
+#include "MarloModel.h"
+#include "MeasurementConfiguration.h"
+#include "Position.h"
+#include "PropertyLibrary.h"
+#include "QCJobTemplate.h"
+#include "QtCommand.h"
+#include "RGBValue.h"
+#include "SchematicImage.h"
+#include "Size.h"
+#include "Standard.h"
+#include "TagDefinition.h"
+#include "TagValue.h"
+#include "ToleranceSet.h"
+#include "UpdateObject.h"
+
+#include <QEventLoop>
+#include <QImage>
+#include <QTemporaryDir>
+#include <QTimer>
+#include <QtTest>
+
+#include <set>
+
+using namespace vemi;
+
+namespace {
+
+const std::vector<std::string> kSampleTypes = {
+    QCJobTemplate::typeId(),   Standard::typeId(),     ColorStandardsLibrary::typeId(),
+    TagDefinition::typeId(),   PropertyLibrary::typeId(), ToleranceSet::typeId(),
+    MeasurementConfiguration::typeId()};
+
+std::shared_ptr<Response> runAndWait(CommandDispatcher& dispatcher, std::shared_ptr<Command> command)
+{
+    auto wrapper = std::make_shared<QtCommand>(std::move(command));
+    std::shared_ptr<Response> response;
+    QEventLoop loop;
+    QObject::connect(wrapper.get(), &QtCommand::responseReceived, &loop, [&](std::shared_ptr<Response> answer) {
+        response = std::move(answer);
+        loop.quit();
+    });
+    QObject::connect(wrapper.get(), &QtCommand::errorReceived, &loop, [&](std::shared_ptr<ErrorInfo> error) {
+        qWarning("store error: %s", qPrintable(error->message()));
+        loop.quit();
+    });
+    QTimer::singleShot(20000, &loop, &QEventLoop::quit);
+    dispatcher.dispatch(wrapper);
+    loop.exec();
+    return response;
+}
+
+std::shared_ptr<DirectoryTreeResponse> tree(CommandDispatcher& dispatcher, const std::string& type)
+{
+    return std::dynamic_pointer_cast<DirectoryTreeResponse>(
+        runAndWait(dispatcher, std::make_shared<GetDirectoryTree>(type)));
+}
+
+template <class T>
+std::vector<std::shared_ptr<T>> fetchAll(CommandDispatcher& dispatcher, int depth = 1)
+{
+    auto command = std::make_shared<GetMarloObjects>();
+    command->setType(T::typeId());
+    command->setDepth(depth);
+    std::vector<std::shared_ptr<T>> objects;
+    if (auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(runAndWait(dispatcher, command))) {
+        for (const auto& object : response->objects())
+            objects.push_back(std::dynamic_pointer_cast<T>(object));
+    }
+    return objects;
+}
+
+// Folders plus entries over every tree the sample data writes to; -1 when a tree cannot be read.
+int itemCount(CommandDispatcher& dispatcher)
+{
+    int count = 0;
+    for (const std::string& type : kSampleTypes) {
+        auto response = tree(dispatcher, type);
+        if (!response)
+            return -1;
+        count += int(response->folders().size() + response->entries().size());
+    }
+    return count;
+}
+
+QImage decode(const std::shared_ptr<SchematicImage>& image)
+{
+    if (!image)
+        return {};
+    const auto& data = image->imageData();
+    QImage decoded;
+    decoded.loadFromData(data.data(), int(data.size()), image->format().c_str());
+    return decoded.convertToFormat(QImage::Format_RGB32);
+}
+
+} // namespace
+
+class tst_SampleData : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void initTestCase();
+    void fillsEachTreeInOneFolder_data();
+    void fillsEachTreeInOneFolder();
+    void templatesAreComplete_data();
+    void templatesAreComplete();
+    void librariesResolveTheirMembers_data();
+    void librariesResolveTheirMembers();
+    void displayColoursFollowLab_data();
+    void displayColoursFollowLab();
+    void secondRunAddsNothing();
+    void storeWithTemplateTreeIsLeftAlone_data();
+    void storeWithTemplateTreeIsLeftAlone();
+    void failureReportsStoreMessage();
+
+private:
+    QTemporaryDir m_dir;
+    std::unique_ptr<MarloModel> m_store;
+    std::shared_ptr<CommandDispatcher> m_dispatcher;
+};
+
+void tst_SampleData::initTestCase()
+{
+    QVERIFY(m_dir.isValid());
+    m_store = std::make_unique<MarloModel>(m_dir.filePath("seeded.sqlite"));
+    QCOMPARE(m_store->open(), QString());
+    m_dispatcher = m_store->commandDispatcher("");
+    QCOMPARE(SampleData::seedIfEmpty(*m_store), QString());
+}
+
+void tst_SampleData::fillsEachTreeInOneFolder_data()
+{
+    QTest::addColumn<QString>("type");
+    QTest::addColumn<QString>("folder");
+    QTest::addColumn<int>("entries");
+    QTest::newRow("job templates") << QString::fromStdString(QCJobTemplate::typeId()) << "Sample Job Templates" << 2;
+    QTest::newRow("standards stored apart from their library")
+        << QString::fromStdString(Standard::typeId()) << "Samples" << 6;
+    QTest::newRow("standards library") << QString::fromStdString(ColorStandardsLibrary::typeId()) << "Samples" << 1;
+    QTest::newRow("tag definitions stored apart from their library")
+        << QString::fromStdString(TagDefinition::typeId()) << "Samples" << 3;
+    QTest::newRow("property library") << QString::fromStdString(PropertyLibrary::typeId()) << "Samples" << 1;
+    QTest::newRow("tolerance set") << QString::fromStdString(ToleranceSet::typeId()) << "Samples" << 1;
+    QTest::newRow("measurement configuration")
+        << QString::fromStdString(MeasurementConfiguration::typeId()) << "Samples" << 1;
+}
+
+void tst_SampleData::fillsEachTreeInOneFolder()
+{
+    QFETCH(QString, type);
+    QFETCH(QString, folder);
+    QFETCH(int, entries);
+
+    auto response = tree(*m_dispatcher, type.toStdString());
+    QVERIFY(response);
+    QCOMPARE(int(response->folders().size()), 1);
+    QCOMPARE(QString::fromStdString(response->folders().front().name), folder);
+    QCOMPARE(int(response->entries().size()), entries);
+    for (const auto& entry : response->entries())
+        QCOMPARE(entry->folderId(), response->folders().front().id);
+}
+
+void tst_SampleData::templatesAreComplete_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::newRow("door panel") << "Door Panel Trim";
+    QTest::newRow("dashboard") << "Dashboard Fascia";
+}
+
+void tst_SampleData::templatesAreComplete()
+{
+    QFETCH(QString, name);
+
+    std::shared_ptr<QCJobTemplate> jobTemplate;
+    for (const auto& candidate : fetchAll<QCJobTemplate>(*m_dispatcher)) {
+        if (candidate && candidate->name() == name.toStdString())
+            jobTemplate = candidate;
+    }
+    QVERIFY(jobTemplate);
+    QVERIFY(jobTemplate->measurementConfiguration());
+    QCOMPARE(int(jobTemplate->sharedToleranceSets().size()), 1);
+
+    // Tag values must name the template's own copies of the definitions.
+    std::set<std::string> definitionIds;
+    for (const auto& definition : jobTemplate->tagDefinitions())
+        definitionIds.insert(definition->id());
+    QCOMPARE(int(definitionIds.size()), 3);
+    QCOMPARE(int(jobTemplate->tagValues().size()), 3);
+    for (const auto& value : jobTemplate->tagValues()) {
+        QVERIFY(definitionIds.count(value->definitionId()));
+        QVERIFY(!value->value().empty());
+    }
+
+    // The template's standards are copies of stored standards, not new objects.
+    std::set<std::string> storedStandardIds;
+    for (const auto& standard : fetchAll<Standard>(*m_dispatcher))
+        storedStandardIds.insert(standard->id());
+    std::map<std::string, std::shared_ptr<Standard>> standards;
+    for (const auto& standard : jobTemplate->standards()) {
+        QVERIFY(storedStandardIds.count(standard->id()));
+        standards[standard->id()] = standard;
+    }
+
+    const QImage schematic = decode(jobTemplate->schematicImage());
+    QVERIFY(!schematic.isNull());
+    QVERIFY(schematic.width() >= 800 && schematic.height() >= 500);
+
+    const auto checkPoints = jobTemplate->checkPoints();
+    QVERIFY(checkPoints.size() >= 3 && checkPoints.size() <= 5);
+    for (const auto& checkPoint : checkPoints) {
+        const QString label = QString::fromStdString(checkPoint->name());
+        QVERIFY2(!checkPoint->autoStandard(), qPrintable(label));
+        QVERIFY2(checkPoint->standard() && standards.count(checkPoint->standard()->id()), qPrintable(label));
+
+        const QRect area(checkPoint->position()->x(), checkPoint->position()->y(), checkPoint->size()->width(),
+                         checkPoint->size()->height());
+        QVERIFY2(area.width() > 0 && area.width() <= 55 && area.height() > 0 && area.height() <= 55,
+                 qPrintable(label));
+        QVERIFY2(schematic.rect().contains(area), qPrintable(label));
+
+        QCOMPARE(checkPoint->schematicImage()->format(), std::string("PNG"));
+        const QImage cutOut = decode(checkPoint->schematicImage());
+        QVERIFY2(cutOut == schematic.copy(area), qPrintable(label));
+
+        // The area lies on a region painted in the colour of its standard.
+        const auto rgb = standards.at(checkPoint->standard()->id())->displayRGB();
+        QCOMPARE(QColor(cutOut.pixel(cutOut.rect().center())), QColor(rgb->red(), rgb->green(), rgb->blue()));
+    }
+
+    int couples = 0;
+    for (const auto& item : jobTemplate->checkListItems()) {
+        auto couple = std::dynamic_pointer_cast<CheckPointCouple>(item);
+        if (!couple)
+            continue;
+        ++couples;
+        QCOMPARE(couple->name(), std::string("A"));
+        QCOMPARE(int(couple->checkPoints().size()), 2);
+        QCOMPARE(couple->checkPoints()[0]->matchPoint(), std::string("<CP1>"));
+        QCOMPARE(couple->checkPoints()[1]->matchPoint(), std::string("<CP2>"));
+    }
+    QCOMPARE(couples, 1);
+}
+
+void tst_SampleData::librariesResolveTheirMembers_data()
+{
+    QTest::addColumn<bool>("standardsLibrary");
+    QTest::addColumn<QStringList>("members");
+    QTest::newRow("standards library") << true
+                                       << QStringList{"Ivory Beige", "Graphite Grey", "Signal Red", "Ocean Blue",
+                                                      "Leaf Green", "Sun Yellow"};
+    QTest::newRow("property library") << false << QStringList{"Supplier", "Part Number", "Material"};
+}
+
+void tst_SampleData::librariesResolveTheirMembers()
+{
+    QFETCH(bool, standardsLibrary);
+    QFETCH(QStringList, members);
+
+    // Names come only from the stored members: an unresolved stand-in has none.
+    QStringList names;
+    if (standardsLibrary) {
+        const auto libraries = fetchAll<ColorStandardsLibrary>(*m_dispatcher, 2);
+        QCOMPARE(int(libraries.size()), 1);
+        for (const auto& standard : libraries.front()->standards())
+            names << QString::fromStdString(standard->name());
+    } else {
+        const auto libraries = fetchAll<PropertyLibrary>(*m_dispatcher, 2);
+        QCOMPARE(int(libraries.size()), 1);
+        for (const auto& definition : libraries.front()->properties())
+            names << QString::fromStdString(definition->name());
+    }
+    QCOMPARE(names, members);
+}
+
+void tst_SampleData::displayColoursFollowLab_data()
+{
+    // Expected values worked out by hand: the Lab values taken relative to their white
+    // and carried to the sRGB white with the Bradford transform, which is what a
+    // relative colorimetric rendering does; 8-bit channels clip out-of-gamut colours.
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<QColor>("expected");
+    QTest::newRow("light warm beige") << "Ivory Beige" << QColor(220, 204, 172);
+    QTest::newRow("dark neutral grey") << "Graphite Grey" << QColor(76, 79, 84);
+    QTest::newRow("saturated red") << "Signal Red" << QColor(171, 31, 41);
+    QTest::newRow("mid blue") << "Ocean Blue" << QColor(43, 105, 151);
+    QTest::newRow("mid green") << "Leaf Green" << QColor(50, 128, 63);
+    QTest::newRow("yellow at the gamut edge") << "Sun Yellow" << QColor(242, 192, 0);
+}
+
+void tst_SampleData::displayColoursFollowLab()
+{
+    QFETCH(QString, name);
+    QFETCH(QColor, expected);
+
+    std::shared_ptr<Standard> standard;
+    for (const auto& candidate : fetchAll<Standard>(*m_dispatcher)) {
+        if (candidate->name() == name.toStdString())
+            standard = candidate;
+    }
+    QVERIFY(standard);
+    auto lab = std::dynamic_pointer_cast<LabValue>(standard->appearanceValues(0)->colorValues().at(0));
+    QVERIFY(lab);
+    QCOMPARE(lab->colorimetricCondition(), std::string("D65/10"));
+
+    const auto rgb = standard->displayRGB();
+    QVERIFY(rgb);
+    const QColor actual(rgb->red(), rgb->green(), rgb->blue());
+    const int tolerance = 2;
+    QVERIFY2(qAbs(actual.red() - expected.red()) <= tolerance && qAbs(actual.green() - expected.green()) <= tolerance
+                 && qAbs(actual.blue() - expected.blue()) <= tolerance,
+             qPrintable(QStringLiteral("%1 shows as %2").arg(name, actual.name())));
+}
+
+void tst_SampleData::secondRunAddsNothing()
+{
+    const int before = itemCount(*m_dispatcher);
+    QVERIFY(before > 0);
+    QCOMPARE(SampleData::seedIfEmpty(*m_store), QString());
+    QCOMPARE(itemCount(*m_dispatcher), before);
+}
+
+void tst_SampleData::storeWithTemplateTreeIsLeftAlone_data()
+{
+    QTest::addColumn<bool>("folderOnly");
+    QTest::newRow("a template at the top level") << false;
+    QTest::newRow("only an empty template folder") << true;
+}
+
+void tst_SampleData::storeWithTemplateTreeIsLeftAlone()
+{
+    QFETCH(bool, folderOnly);
+
+    MarloModel store(m_dir.filePath(QStringLiteral("used-%1.sqlite").arg(folderOnly)));
+    QCOMPARE(store.open(), QString());
+    auto dispatcher = store.commandDispatcher("");
+    if (folderOnly) {
+        QVERIFY(runAndWait(*dispatcher, std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", "Mine")));
+    } else {
+        auto update = std::make_shared<UpdateObject>();
+        auto jobTemplate = std::make_shared<QCJobTemplate>();
+        jobTemplate->setName("Bumper");
+        update->setObject(jobTemplate);
+        update->setFolderId("");
+        QVERIFY(runAndWait(*dispatcher, update));
+    }
+    QCOMPARE(itemCount(*dispatcher), 1);
+
+    QCOMPARE(SampleData::seedIfEmpty(store), QString());
+    QCOMPARE(itemCount(*dispatcher), 1);
+}
+
+void tst_SampleData::failureReportsStoreMessage()
+{
+    const QString path = m_dir.filePath("read-only.sqlite");
+    {
+        MarloModel created(path);
+        QCOMPARE(created.open(), QString());
+    }
+    StoreOptions options;
+    options.readOnly = true;
+    MarloModel store(path, options);
+    QCOMPARE(store.open(), QString());
+
+    const QString message = SampleData::seedIfEmpty(store);
+    QVERIFY2(message.contains("read-only"), qPrintable(message));
+    QCOMPARE(itemCount(*store.commandDispatcher("")), 0);
+}
+
+QTEST_MAIN(tst_SampleData)
+
+#include "tst_sampledata.moc"

@@ -1,0 +1,101 @@
+#include "PluginCatalog.h"
+
+#include "ClientInterface.h"
+
+#include <QFile>
+#include <QProcess>
+#include <QTemporaryDir>
+#include <QtTest>
+
+using namespace vemi;
+
+class tst_Shell : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void catalogTakesOnlyClientPlugins();
+    void badStoreFileStopsTheShell_data();
+    void badStoreFileStopsTheShell();
+    void shellStartsWithTheEditorTab();
+
+private:
+    static QProcess* runShell(const QStringList& arguments, const QString& home);
+};
+
+void tst_Shell::catalogTakesOnlyClientPlugins()
+{
+    QTemporaryDir folder;
+    QVERIFY(QFile::copy(QStringLiteral(CLIENT_PLUGIN), folder.filePath(QStringLiteral("libpellam.so"))));
+    QVERIFY(QFile::copy(QStringLiteral(FOREIGN_PLUGIN), folder.filePath(QStringLiteral("libforeign.so"))));
+    QFile fake(folder.filePath(QStringLiteral("libnotaplugin.so")));
+    QVERIFY(fake.open(QIODevice::WriteOnly));
+    fake.write("not a shared library");
+    fake.close();
+
+    PluginCatalog catalog;
+    catalog.load(folder.path());
+    QCOMPARE(catalog.clients().size(), size_t(1));
+    QCOMPARE(catalog.clients().front().client->clientTitle(), QStringLiteral("QC Job Template Editor"));
+    QCOMPARE(catalog.messages().size(), 2);
+    QVERIFY(catalog.messages().filter(QStringLiteral("libforeign.so")).first().contains(QStringLiteral("org.example.SomethingElse")));
+    QVERIFY(!catalog.messages().filter(QStringLiteral("libnotaplugin.so")).isEmpty());
+}
+
+QProcess* tst_Shell::runShell(const QStringList& arguments, const QString& home)
+{
+    auto* process = new QProcess;
+    QProcessEnvironment environment = QProcessEnvironment::systemEnvironment();
+    environment.insert(QStringLiteral("QT_QPA_PLATFORM"), QStringLiteral("offscreen"));
+    environment.insert(QStringLiteral("HOME"), home);
+    environment.insert(QStringLiteral("XDG_CONFIG_HOME"), home + QStringLiteral("/config"));
+    environment.insert(QStringLiteral("XDG_DATA_HOME"), home + QStringLiteral("/data"));
+    process->setProcessEnvironment(environment);
+    process->start(QStringLiteral(QCHOST), arguments);
+    return process;
+}
+
+void tst_Shell::badStoreFileStopsTheShell_data()
+{
+    QTest::addColumn<QByteArray>("content");
+    QTest::newRow("a text file") << QByteArray("shopping list: milk, eggs\n").repeated(50);
+    QTest::newRow("an image") << QByteArray("\x89PNG\r\n\x1a\n", 8) + QByteArray(300, '\x07');
+}
+
+void tst_Shell::badStoreFileStopsTheShell()
+{
+    QFETCH(QByteArray, content);
+    QTemporaryDir home;
+    const QString path = home.filePath(QStringLiteral("not-a-store.sqlite"));
+    QFile file(path);
+    QVERIFY(file.open(QIODevice::WriteOnly));
+    file.write(content);
+    file.close();
+
+    std::unique_ptr<QProcess> shell(runShell({QStringLiteral("--store"), path}, home.path()));
+    QVERIFY(shell->waitForFinished(30000));
+    QCOMPARE(shell->exitStatus(), QProcess::NormalExit);
+    QVERIFY(shell->exitCode() != 0);
+    const QString errors = QString::fromLocal8Bit(shell->readAllStandardError());
+    QVERIFY2(errors.contains(path), qPrintable(errors));
+    QVERIFY2(errors.contains(QStringLiteral("not a store")), qPrintable(errors));
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    QCOMPARE(file.readAll(), content);
+}
+
+void tst_Shell::shellStartsWithTheEditorTab()
+{
+    QTemporaryDir home;
+    const QString shot = home.filePath(QStringLiteral("shell.png"));
+    std::unique_ptr<QProcess> shell(runShell({QStringLiteral("--store"), home.filePath(QStringLiteral("store.sqlite")),
+                                              QStringLiteral("--screenshot"), shot},
+                                             home.path()));
+    QVERIFY(shell->waitForFinished(60000));
+    QCOMPARE(shell->exitCode(), 0);
+    const QImage picture(shot);
+    QVERIFY(!picture.isNull());
+    QVERIFY(picture.width() >= 800);
+}
+
+QTEST_MAIN(tst_Shell)
+#include "tst_shell.moc"

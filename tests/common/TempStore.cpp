@@ -1,0 +1,71 @@
+#include "TempStore.h"
+
+#include "BaseObject.h"
+#include "CommandDispatcher.h"
+#include "ErrorInfo.h"
+#include "GetMarloObject.h"
+#include "GetMarloObjectResponse.h"
+#include "QtCommand.h"
+#include "UpdateObject.h"
+
+#include <QEventLoop>
+#include <QTimer>
+
+#include <cstdio>
+
+TempStore::TempStore(vemi::StoreOptions options)
+    : m_path(m_dir.filePath(QStringLiteral("store.sqlite")))
+{
+    reopen(options);
+}
+
+TempStore::~TempStore() = default;
+
+void TempStore::reopen(vemi::StoreOptions options)
+{
+    m_model.reset();
+    m_model = std::make_unique<vemi::MarloModel>(m_path, options);
+    const QString error = m_model->open();
+    if (!error.isEmpty())
+        std::fprintf(stderr, "TempStore: %s\n", qPrintable(error));
+}
+
+TempStore::Answer TempStore::run(std::shared_ptr<vemi::Command> command)
+{
+    Answer answer;
+    QEventLoop loop;
+    auto wrapper = std::make_shared<vemi::QtCommand>(std::move(command));
+    QObject::connect(wrapper.get(), &vemi::QtCommand::responseReceived, &loop,
+                     [&](std::shared_ptr<vemi::Response> response) { answer.response = response; loop.quit(); });
+    QObject::connect(wrapper.get(), &vemi::QtCommand::errorReceived, &loop,
+                     [&](std::shared_ptr<vemi::ErrorInfo> error) { answer.error = error; loop.quit(); });
+    QTimer::singleShot(20000, &loop, [&]() { answer.timedOut = true; loop.quit(); });
+    m_model->commandDispatcher("")->dispatch(wrapper);
+    loop.exec();
+    return answer;
+}
+
+std::shared_ptr<vemi::Response> TempStore::save(std::shared_ptr<vemi::BaseObject> object, const std::string* folderId)
+{
+    auto update = std::make_shared<vemi::UpdateObject>();
+    update->setObject(std::move(object));
+    if (folderId)
+        update->setFolderId(*folderId);
+    const Answer answer = run(update);
+    if (answer.error)
+        std::fprintf(stderr, "TempStore: %s\n", qPrintable(answer.error->message()));
+    return answer.response;
+}
+
+std::shared_ptr<vemi::BaseObject> TempStore::fetch(const std::string& type, const std::string& id, int depth)
+{
+    auto get = std::make_shared<vemi::GetMarloObject>();
+    get->setType(type);
+    get->setId(id);
+    get->setDepth(depth);
+    const Answer answer = run(get);
+    if (answer.error)
+        std::fprintf(stderr, "TempStore: %s\n", qPrintable(answer.error->message()));
+    const auto response = std::dynamic_pointer_cast<vemi::GetMarloObjectResponse>(answer.response);
+    return response ? response->object() : nullptr;
+}

@@ -1,0 +1,47 @@
+#pragma once
+
+#include "MarloModel.h"
+
+#include <QTemporaryDir>
+
+#include <memory>
+#include <string>
+
+namespace vemi {
+class BaseObject;
+class Command;
+class ErrorInfo;
+class Response;
+} // namespace vemi
+
+// A real store on a file in a temporary folder, with helpers that run a
+// command and wait for its answer.
+class TempStore
+{
+public:
+    struct Answer
+    {
+        std::shared_ptr<vemi::Response> response;
+        std::shared_ptr<vemi::ErrorInfo> error;
+        bool timedOut = false;
+    };
+
+    explicit TempStore(vemi::StoreOptions options = {});
+    ~TempStore();
+
+    QString path() const { return m_path; }
+    QString folder() const { return m_dir.path(); }
+    vemi::MarloModel& model() { return *m_model; }
+    // Closes the store (its worker finishes first) and opens the same file anew.
+    void reopen(vemi::StoreOptions options = {});
+
+    Answer run(std::shared_ptr<vemi::Command> command);
+    // Both return null (and print the error) when the store refuses.
+    std::shared_ptr<vemi::Response> save(std::shared_ptr<vemi::BaseObject> object, const std::string* folderId = nullptr);
+    std::shared_ptr<vemi::BaseObject> fetch(const std::string& type, const std::string& id, int depth = 1);
+
+private:
+    QTemporaryDir m_dir;
+    QString m_path;
+    std::unique_ptr<vemi::MarloModel> m_model;
+};

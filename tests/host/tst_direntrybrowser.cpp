@@ -1,0 +1,257 @@
+#include "ModalAnswer.h"
+#include "TempStore.h"
+
+#include "CreateFolder.h"
+#include "DirEntry.h"
+#include "DirEntryBrowserInterface.h"
+#include "DirEntryBrowserWidget.h"
+#include "DirEntryTreeModel.h"
+#include "FolderResponse.h"
+#include "QCJobTemplate.h"
+
+#include <QAction>
+#include <QTreeView>
+#include <QtTest>
+
+using namespace vemi;
+using Node = BaseObjectTreeModel::Node;
+
+namespace {
+
+// The client side of a browser of job templates.
+class TemplateCallbacks : public DirEntryBrowserInterface
+{
+public:
+    std::shared_ptr<NamedObject> newNamedObject() override
+    {
+        auto jobTemplate = std::make_shared<QCJobTemplate>();
+        jobTemplate->setName(defaultNamedObjectName(QStringLiteral("Job Template")));
+        return jobTemplate;
+    }
+    std::string namedObjectTypeId() override { return QCJobTemplate::typeId(); }
+};
+
+// A browser over a real store, loaded and ready.
+struct Browser
+{
+    explicit Browser(TempStore& store)
+        : model(store.model()), widget()
+    {
+        widget.initialize(&model, &callbacks, QCJobTemplate::typeId(), QStringLiteral("Job Templates"),
+                          QStringLiteral("New Job Template"), "Test", nullptr, false);
+        QTest::qWait(0);
+    }
+    Node* find(const QString& name) const
+    {
+        for (Node* node : model.descendants(model.root())) {
+            if (node->displayName() == name)
+                return node;
+        }
+        return nullptr;
+    }
+    void select(Node* node)
+    {
+        widget.treeView()->selectionModel()->setCurrentIndex(model.indexFromNode(node),
+                                                             QItemSelectionModel::ClearAndSelect);
+    }
+
+    TemplateCallbacks callbacks;
+    DirEntryTreeModel model;
+    DirEntryBrowserWidget widget;
+};
+
+std::string createFolder(TempStore& store, const std::string& name)
+{
+    const auto answer = store.run(std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", name));
+    const auto folder = std::dynamic_pointer_cast<FolderResponse>(answer.response);
+    return folder ? folder->folder().id : std::string();
+}
+
+void storeTemplate(TempStore& store, const std::string& name, const std::string& folderId)
+{
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setName(name);
+    store.save(jobTemplate, &folderId);
+}
+
+} // namespace
+
+class tst_DirEntryBrowser : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init() { QSettings().clear(); }
+    void newObjectGetsFirstFreeNameOfItsFolder_data();
+    void newObjectGetsFirstFreeNameOfItsFolder();
+    void savedNewObjectIsFoundAfterRestart();
+    void modifiedObjectEnablesSave();
+    void failedSaveKeepsObjectModified();
+    void selectionCarriesLoadedObjects();
+    void mayCloseAsksOnlyAboutUnsavedWork_data();
+    void mayCloseAsksOnlyAboutUnsavedWork();
+};
+
+void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder_data()
+{
+    QTest::addColumn<QStringList>("inFolder");
+    QTest::addColumn<QStringList>("elsewhere");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("empty folder") << QStringList{} << QStringList{} << "Job Template";
+    QTest::newRow("base name taken") << QStringList{"Job Template"} << QStringList{} << "Job Template 2";
+    QTest::newRow("gap is filled") << QStringList{"Job Template", "Job Template 3"} << QStringList{} << "Job Template 2";
+    QTest::newRow("names of other folders do not count") << QStringList{} << QStringList{"Job Template"}
+                                                         << "Job Template";
+}
+
+void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder()
+{
+    QFETCH(QStringList, inFolder);
+    QFETCH(QStringList, elsewhere);
+    QFETCH(QString, expected);
+    TempStore store;
+    const std::string folder = createFolder(store, "Folder");
+    createFolder(store, "Other");
+    const std::string other = createFolder(store, "Other 2");
+    for (const QString& name : inFolder)
+        storeTemplate(store, name.toStdString(), folder);
+    for (const QString& name : elsewhere)
+        storeTemplate(store, name.toStdString(), other);
+
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Folder")));
+    browser.select(browser.find(QStringLiteral("Folder")));
+    browser.widget.actionNew()->trigger();
+
+    Node* created = browser.find(expected);
+    QVERIFY(created);
+    QVERIFY(created->isModified());
+    QCOMPARE(created->parent(), browser.find(QStringLiteral("Folder")));
+}
+
+void tst_DirEntryBrowser::savedNewObjectIsFoundAfterRestart()
+{
+    TempStore store;
+    const std::string folder = createFolder(store, "Samples");
+    {
+        Browser browser(store);
+        QTRY_VERIFY(browser.find(QStringLiteral("Samples")));
+        browser.select(browser.find(QStringLiteral("Samples")));
+        browser.widget.actionNew()->trigger();
+        QVERIFY(browser.widget.actionSave()->isEnabled());
+        browser.widget.actionSave()->trigger();
+        QTRY_VERIFY(browser.find(QStringLiteral("Job Template")));
+        QVERIFY(!browser.widget.actionSave()->isEnabled());
+    }
+    store.reopen();
+    Browser restarted(store);
+    QTRY_VERIFY(restarted.find(QStringLiteral("Job Template")));
+    Node* saved = restarted.find(QStringLiteral("Job Template"));
+    QCOMPARE(static_cast<DirEntryTreeModel::DirEntryNode*>(saved)->dirEntry()->folderId(), folder);
+}
+
+void tst_DirEntryBrowser::modifiedObjectEnablesSave()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
+    browser.select(browser.find(QStringLiteral("Door Panel")));
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    QVERIFY(!browser.widget.actionSave()->isEnabled());
+
+    auto object = browser.find(QStringLiteral("Door Panel"))->object();
+    browser.widget.namedObjectWasModified(object);
+    QVERIFY(browser.find(QStringLiteral("Door Panel"))->isModified());
+    const QModelIndex index = browser.model.indexFromNode(browser.find(QStringLiteral("Door Panel")));
+    QCOMPARE(index.data().toString(), QStringLiteral("Door Panel *"));
+    QVERIFY(browser.widget.actionSave()->isEnabled());
+}
+
+void tst_DirEntryBrowser::failedSaveKeepsObjectModified()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    StoreOptions readOnly;
+    readOnly.readOnly = true;
+    store.reopen(readOnly);
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
+    browser.select(browser.find(QStringLiteral("Door Panel")));
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Door Panel"))->object());
+
+    browser.widget.actionSave()->trigger();
+    QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
+    const QString message = browser.widget.findChild<QMessageBox*>()->text();
+    QVERIFY2(message.contains(QStringLiteral("read-only")), qPrintable(message));
+    QVERIFY(browser.find(QStringLiteral("Door Panel"))->isModified());
+    QVERIFY(browser.widget.actionSave()->isEnabled());
+}
+
+void tst_DirEntryBrowser::selectionCarriesLoadedObjects()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    storeTemplate(store, "Dashboard", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Dashboard")));
+    QSignalSpy selections(&browser.widget, &DirEntryBrowserWidget::sgSelectionChanged);
+
+    auto* selection = browser.widget.treeView()->selectionModel();
+    selection->select(browser.model.indexFromNode(browser.find(QStringLiteral("Dashboard"))), QItemSelectionModel::Select);
+    selection->select(browser.model.indexFromNode(browser.find(QStringLiteral("Door Panel"))), QItemSelectionModel::Select);
+    // The second click replaces the first before its object is loaded: one announcement.
+    QTRY_COMPARE(selections.count(), 1);
+    const auto nodes = selections.last().first().value<QVector<Node*>>();
+    QCOMPARE(nodes.size(), 2);
+    for (Node* node : nodes) {
+        QVERIFY(node->object());
+        QCOMPARE(QString::fromStdString(node->object()->name()), node->displayName());
+    }
+}
+
+void tst_DirEntryBrowser::mayCloseAsksOnlyAboutUnsavedWork_data()
+{
+    QTest::addColumn<bool>("modified");
+    QTest::addColumn<int>("answer");
+    QTest::addColumn<bool>("mayClose");
+    QTest::addColumn<bool>("savedAfterwards");
+    QTest::newRow("nothing unsaved closes without asking") << false << 0 << true << true;
+    QTest::newRow("cancel keeps the tab open") << true << int(QMessageBox::Cancel) << false << false;
+    QTest::newRow("discard closes without saving") << true << int(QMessageBox::Discard) << true << false;
+    QTest::newRow("save stores the object and closes") << true << int(QMessageBox::Save) << true << true;
+}
+
+void tst_DirEntryBrowser::mayCloseAsksOnlyAboutUnsavedWork()
+{
+    QFETCH(bool, modified);
+    QFETCH(int, answer);
+    QFETCH(bool, mayClose);
+    QFETCH(bool, savedAfterwards);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
+    browser.select(browser.find(QStringLiteral("Door Panel")));
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    auto jobTemplate = std::dynamic_pointer_cast<QCJobTemplate>(browser.find(QStringLiteral("Door Panel"))->object());
+    if (modified) {
+        jobTemplate->setDescription("edited");
+        browser.widget.namedObjectWasModified(jobTemplate);
+    }
+    QString question;
+    if (answer)
+        ModalAnswer::clickInNextMessageBox(QMessageBox::StandardButton(answer), &question);
+
+    QCOMPARE(browser.widget.mayClose(), mayClose);
+    QCOMPARE(question.isEmpty(), !answer);
+    if (answer)
+        QVERIFY2(question.contains(QStringLiteral("Door Panel")), qPrintable(question));
+    const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
+    QVERIFY(stored);
+    QCOMPARE(stored->description() == "edited", modified && savedAfterwards);
+}
+
+QTEST_MAIN(tst_DirEntryBrowser)
+#include "tst_direntrybrowser.moc"

@@ -1,0 +1,474 @@
+#include "TempStore.h"
+
+#include "ColorStandardsLibrary.h"
+#include "CommandDispatcher.h"
+#include "CreateFolder.h"
+#include "DeleteDirItems.h"
+#include "DirEntry.h"
+#include "DirectoryTreeResponse.h"
+#include "ErrorInfo.h"
+#include "FolderResponse.h"
+#include "GetDirectoryTree.h"
+#include "GetMarloObject.h"
+#include "GetMarloObjectResponse.h"
+#include "GetMarloObjects.h"
+#include "GetMarloObjectsResponse.h"
+#include "Header.h"
+#include "MoveDirItem.h"
+#include "ObjectCodec.h"
+#include "QCJobTemplate.h"
+#include "QtCommand.h"
+#include "RenameDirItem.h"
+#include "SchematicImage.h"
+#include "Standard.h"
+#include "StoreDatabase.h"
+#include "UpdateObject.h"
+#include "UpdateObjectResponse.h"
+
+#include <QFile>
+#include <QSqlDatabase>
+#include <QSqlError>
+#include <QSqlQuery>
+#include <QThread>
+#include <QtTest>
+
+using namespace vemi;
+
+namespace {
+
+std::shared_ptr<QCJobTemplate> makeTemplate(const std::string& name, int imageBytes = 0)
+{
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setName(name);
+    auto image = std::make_shared<SchematicImage>();
+    std::vector<unsigned char> bytes(static_cast<size_t>(imageBytes));
+    for (size_t i = 0; i < bytes.size(); ++i)
+        bytes[i] = static_cast<unsigned char>((i * 7919) >> 3);
+    image->setImageData(bytes);
+    image->setFormat("png");
+    jobTemplate->setSchematicImage(image);
+    return jobTemplate;
+}
+
+// A second connection to the store file, as another program would open it.
+class RawConnection
+{
+public:
+    explicit RawConnection(const QString& path) : m_name(QStringLiteral("raw-%1").arg(++s_count))
+    {
+        QSqlDatabase database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_name);
+        database.setDatabaseName(path);
+        database.open();
+    }
+    ~RawConnection()
+    {
+        QSqlDatabase::database(m_name).close();
+        QSqlDatabase::removeDatabase(m_name);
+    }
+    bool exec(const QString& sql, const QVariantList& bindings = {})
+    {
+        QSqlQuery query(QSqlDatabase::database(m_name));
+        query.prepare(sql);
+        for (const QVariant& value : bindings)
+            query.addBindValue(value);
+        return query.exec();
+    }
+    QVariant scalar(const QString& sql)
+    {
+        QSqlQuery query(QSqlDatabase::database(m_name));
+        query.exec(sql);
+        return query.next() ? query.value(0) : QVariant();
+    }
+
+private:
+    static inline int s_count = 0;
+    QString m_name;
+};
+
+// Notes on which thread the store ran it.
+class ThreadProbe : public Command
+{
+public:
+    std::shared_ptr<Response> execute(StoreDatabase&) override
+    {
+        executedOn = QThread::currentThread();
+        return std::make_shared<Response>();
+    }
+    std::string description() const override { return "probe"; }
+    QThread* executedOn = nullptr;
+};
+
+std::string folderIdOf(const TempStore::Answer& answer)
+{
+    const auto folder = std::dynamic_pointer_cast<FolderResponse>(answer.response);
+    return folder ? folder->folder().id : std::string();
+}
+
+} // namespace
+
+class tst_Store : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void templateSurvivesRestartByteForByte();
+    void commandsRunInDispatchOrder();
+    void answersArriveOnCallersThread();
+    void updateTakesSnapshotAtDispatch();
+    void wrapperLivesUntilItDelivers();
+    void storeMarksAndConfiguresItsFile();
+    void refusesFilesThatAreNotStores_data();
+    void refusesFilesThatAreNotStores();
+    void damagedObjectIsReportedByItsId();
+    void missingObjectIsAnError();
+    void readOnlyStoreRefusesWrites();
+    void lockedStoreReportsAndRecovers();
+    void libraryMembersResolveAtDepthTwo();
+    void getObjectsListsAllOrTheIdsGiven();
+    void folderTreeOperations();
+    void folderCannotMoveIntoItself();
+    void deletingFolderDeletesItsObjects();
+};
+
+void tst_Store::templateSurvivesRestartByteForByte()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel", 1 << 20);
+    const QByteArray before = ObjectCodec::serialize(*jobTemplate);
+    QVERIFY(store.save(jobTemplate));
+
+    store.reopen();
+    const auto fetched = store.fetch(QCJobTemplate::typeId(), jobTemplate->id());
+    QVERIFY(fetched);
+    QCOMPARE(ObjectCodec::serialize(*fetched), before);
+}
+
+void tst_Store::commandsRunInDispatchOrder()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("v0");
+    QStringList answered;
+    QEventLoop loop;
+    const int count = 20;
+    for (int i = 1; i <= count; ++i) {
+        jobTemplate->setName("v" + std::to_string(i));
+        auto update = std::make_shared<UpdateObject>();
+        update->setObject(jobTemplate);
+        auto wrapper = std::make_shared<QtCommand>(update);
+        connect(wrapper.get(), &QtCommand::responseReceived, &loop, [&, i]() {
+            answered << QString::number(i);
+            if (answered.size() == count)
+                loop.quit();
+        });
+        store.model().commandDispatcher("")->dispatch(wrapper);
+    }
+    QTimer::singleShot(20000, &loop, &QEventLoop::quit);
+    loop.exec();
+
+    QStringList expected;
+    for (int i = 1; i <= count; ++i)
+        expected << QString::number(i);
+    QCOMPARE(answered, expected);
+    const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
+    QVERIFY(stored);
+    QCOMPARE(stored->name(), std::string("v20"));
+}
+
+void tst_Store::answersArriveOnCallersThread()
+{
+    TempStore store;
+    auto probe = std::make_shared<ThreadProbe>();
+    QThread* answeredOn = nullptr;
+    QEventLoop loop;
+    auto wrapper = std::make_shared<QtCommand>(probe);
+    connect(wrapper.get(), &QtCommand::responseReceived, &loop, [&]() {
+        answeredOn = QThread::currentThread();
+        loop.quit();
+    });
+    store.model().commandDispatcher("")->dispatch(wrapper);
+    QTimer::singleShot(20000, &loop, &QEventLoop::quit);
+    loop.exec();
+
+    QVERIFY(probe->executedOn);
+    QVERIFY(probe->executedOn != QThread::currentThread());
+    QCOMPARE(answeredOn, QThread::currentThread());
+}
+
+void tst_Store::updateTakesSnapshotAtDispatch()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("As dispatched");
+    auto update = std::make_shared<UpdateObject>();
+    update->setObject(jobTemplate);
+    QEventLoop loop;
+    auto wrapper = std::make_shared<QtCommand>(update);
+    connect(wrapper.get(), &QtCommand::responseReceived, &loop, &QEventLoop::quit);
+    store.model().commandDispatcher("")->dispatch(wrapper);
+    jobTemplate->setName("Edited after dispatch");
+    loop.exec();
+
+    const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
+    QVERIFY(stored);
+    QCOMPARE(stored->name(), std::string("As dispatched"));
+}
+
+void tst_Store::wrapperLivesUntilItDelivers()
+{
+    TempStore store;
+    auto get = std::make_shared<GetMarloObjects>();
+    get->setType(QCJobTemplate::typeId());
+    bool delivered = false;
+    QObject context;
+    std::weak_ptr<QtCommand> watch;
+    {
+        auto wrapper = std::make_shared<QtCommand>(get);
+        watch = wrapper;
+        connect(wrapper.get(), &QtCommand::responseReceived, &context, [&]() { delivered = true; });
+        store.model().commandDispatcher("")->dispatch(wrapper);
+    }
+    QTRY_VERIFY_WITH_TIMEOUT(delivered, 20000);
+    QTRY_VERIFY(watch.expired());
+}
+
+void tst_Store::storeMarksAndConfiguresItsFile()
+{
+    TempStore store;
+    RawConnection raw(store.path());
+    QCOMPARE(raw.scalar(QStringLiteral("PRAGMA application_id")).toInt(), StoreDatabase::kApplicationId);
+    QCOMPARE(raw.scalar(QStringLiteral("PRAGMA user_version")).toInt(), StoreDatabase::schemaVersion());
+    QCOMPARE(raw.scalar(QStringLiteral("PRAGMA journal_mode")).toString(), QStringLiteral("wal"));
+}
+
+void tst_Store::refusesFilesThatAreNotStores_data()
+{
+    QTest::addColumn<QString>("setup");
+    QTest::addColumn<QString>("expected");
+    QTest::newRow("a text file") << "text" << "not a store";
+    QTest::newRow("another program's SQLite database") << "foreign" << "another program";
+    QTest::newRow("a store from a newer version") << "newer" << "newer version";
+}
+
+void tst_Store::refusesFilesThatAreNotStores()
+{
+    QFETCH(QString, setup);
+    QFETCH(QString, expected);
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("file.sqlite"));
+    if (setup == QLatin1String("text")) {
+        QFile file(path);
+        QVERIFY(file.open(QIODevice::WriteOnly));
+        file.write(QByteArray("These are the minutes of the last meeting, not a database.\n").repeated(100));
+    } else {
+        RawConnection raw(path);
+        if (setup == QLatin1String("foreign")) {
+            QVERIFY(raw.exec(QStringLiteral("CREATE TABLE people(name TEXT)")));
+        } else {
+            QVERIFY(raw.exec(QStringLiteral("PRAGMA application_id = %1").arg(StoreDatabase::kApplicationId)));
+            QVERIFY(raw.exec(QStringLiteral("PRAGMA user_version = 99")));
+        }
+    }
+    QFile original(path);
+    QVERIFY(original.open(QIODevice::ReadOnly));
+    const QByteArray before = original.readAll();
+    original.close();
+
+    const QString error = [&] { MarloModel model(path); return model.open(); }();
+    QVERIFY2(error.contains(expected), qPrintable(error));
+    QVERIFY2(error.contains(path), qPrintable(error));
+    QVERIFY(original.open(QIODevice::ReadOnly));
+    QCOMPARE(original.readAll(), before);
+}
+
+void tst_Store::damagedObjectIsReportedByItsId()
+{
+    TempStore store;
+    auto damaged = makeTemplate("Damaged");
+    auto intact = makeTemplate("Intact");
+    QVERIFY(store.save(damaged));
+    QVERIFY(store.save(intact));
+    {
+        RawConnection raw(store.path());
+        QVERIFY(raw.exec(QStringLiteral("UPDATE objects SET data = ? WHERE id = ?"),
+                         {QByteArray("\xa3\x01garbage", 9), QString::fromStdString(damaged->id())}));
+    }
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(QCJobTemplate::typeId());
+    get->setId(damaged->id());
+    const auto answer = store.run(get);
+    QVERIFY(answer.error);
+    QVERIFY2(answer.error->message().contains(QString::fromStdString(damaged->id())), qPrintable(answer.error->message()));
+    QVERIFY(store.fetch(QCJobTemplate::typeId(), intact->id()));
+}
+
+void tst_Store::missingObjectIsAnError()
+{
+    TempStore store;
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(QCJobTemplate::typeId());
+    get->setId("no-such-id");
+    const auto answer = store.run(get);
+    QVERIFY(!answer.response);
+    QVERIFY(answer.error);
+    QVERIFY(answer.error->message().contains(QStringLiteral("no-such-id")));
+}
+
+void tst_Store::readOnlyStoreRefusesWrites()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Kept");
+    QVERIFY(store.save(jobTemplate));
+    StoreOptions readOnly;
+    readOnly.readOnly = true;
+    store.reopen(readOnly);
+
+    jobTemplate->setName("Changed");
+    auto update = std::make_shared<UpdateObject>();
+    update->setObject(jobTemplate);
+    const auto answer = store.run(update);
+    QVERIFY(answer.error);
+    QVERIFY2(answer.error->message().contains(QStringLiteral("read-only")), qPrintable(answer.error->message()));
+    QVERIFY(answer.error->message().contains(store.path()));
+    const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
+    QVERIFY(stored);
+    QCOMPARE(stored->name(), std::string("Kept"));
+}
+
+void tst_Store::lockedStoreReportsAndRecovers()
+{
+    StoreOptions impatient;
+    impatient.busyTimeoutMs = 100;
+    TempStore store(impatient);
+    auto jobTemplate = makeTemplate("Waits");
+    {
+        RawConnection other(store.path());
+        QVERIFY(other.exec(QStringLiteral("BEGIN EXCLUSIVE")));
+        auto update = std::make_shared<UpdateObject>();
+        update->setObject(jobTemplate);
+        const auto answer = store.run(update);
+        QVERIFY(answer.error);
+        QVERIFY2(answer.error->message().contains(QStringLiteral("locked")), qPrintable(answer.error->message()));
+        QVERIFY(other.exec(QStringLiteral("ROLLBACK")));
+    }
+    QVERIFY(store.save(jobTemplate));
+}
+
+void tst_Store::libraryMembersResolveAtDepthTwo()
+{
+    TempStore store;
+    auto red = std::make_shared<Standard>();
+    red->setName("Signal Red");
+    auto blue = std::make_shared<Standard>();
+    blue->setName("Ocean Blue");
+    auto library = std::make_shared<ColorStandardsLibrary>();
+    library->setName("Interior");
+    library->setStandards({red, blue});
+    QVERIFY(store.save(red));
+    QVERIFY(store.save(blue));
+    QVERIFY(store.save(library));
+
+    const auto shallow = std::dynamic_pointer_cast<ColorStandardsLibrary>(
+        store.fetch(ColorStandardsLibrary::typeId(), library->id(), 1));
+    QVERIFY(shallow);
+    QCOMPARE(shallow->standards().size(), size_t(2));
+    QCOMPARE(shallow->standards()[0]->id(), red->id());
+    QCOMPARE(shallow->standards()[0]->name(), std::string());
+
+    const auto deep = std::dynamic_pointer_cast<ColorStandardsLibrary>(
+        store.fetch(ColorStandardsLibrary::typeId(), library->id(), 2));
+    QVERIFY(deep);
+    QCOMPARE(deep->standards()[0]->name(), std::string("Signal Red"));
+    QCOMPARE(deep->standards()[1]->name(), std::string("Ocean Blue"));
+}
+
+void tst_Store::getObjectsListsAllOrTheIdsGiven()
+{
+    TempStore store;
+    auto b = makeTemplate("B");
+    auto a = makeTemplate("A");
+    auto c = makeTemplate("C");
+    for (const auto& jobTemplate : {b, a, c})
+        QVERIFY(store.save(jobTemplate));
+    QVERIFY(store.save(std::make_shared<Standard>()));
+
+    const auto namesOf = [&](std::vector<std::string> ids) {
+        auto get = std::make_shared<GetMarloObjects>();
+        get->setType(QCJobTemplate::typeId());
+        get->setIds(ids);
+        const auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(get).response);
+        QStringList names;
+        for (const auto& object : response ? response->objects() : std::vector<std::shared_ptr<BaseObject>>())
+            names << QString::fromStdString(object->header()->name());
+        return names;
+    };
+    QCOMPARE(namesOf({}), QStringList({"A", "B", "C"}));
+    QCOMPARE(namesOf({c->id(), a->id()}), QStringList({"C", "A"}));
+}
+
+void tst_Store::folderTreeOperations()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string samples = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "Samples")));
+    QVERIFY(!samples.empty());
+    const auto duplicate = store.run(std::make_shared<CreateFolder>(type, "", "Samples"));
+    QVERIFY(duplicate.error);
+    QVERIFY(duplicate.error->message().contains(QStringLiteral("already exists")));
+    // The same name is free in the tree of another type.
+    QVERIFY(!folderIdOf(store.run(std::make_shared<CreateFolder>(Standard::typeId(), "", "Samples"))).empty());
+
+    auto jobTemplate = makeTemplate("Door Panel");
+    const auto saved = std::dynamic_pointer_cast<UpdateObjectResponse>(store.save(jobTemplate, &samples));
+    QVERIFY(saved && saved->entry());
+    QCOMPARE(saved->entry()->folderId(), samples);
+
+    QVERIFY(!store.run(std::make_shared<RenameDirItem>(DirItemKind::Entry, saved->entry()->id(), "Door Trim")).error);
+    const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(
+        store.run(std::make_shared<GetDirectoryTree>(type)).response);
+    QVERIFY(tree);
+    QCOMPARE(tree->folders().size(), size_t(1));
+    QCOMPARE(tree->entries().size(), size_t(1));
+    QCOMPARE(tree->entries()[0]->header()->name(), std::string("Door Trim"));
+    QCOMPARE(tree->entries()[0]->entryObjectId(), jobTemplate->id());
+    const auto renamed = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(type, jobTemplate->id()));
+    QVERIFY(renamed);
+    QCOMPARE(renamed->name(), std::string("Door Trim"));
+}
+
+void tst_Store::folderCannotMoveIntoItself()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string outer = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "Outer")));
+    const std::string inner = folderIdOf(store.run(std::make_shared<CreateFolder>(type, outer, "Inner")));
+    const auto answer = store.run(std::make_shared<MoveDirItem>(DirItemKind::Folder, outer, inner));
+    QVERIFY(answer.error);
+    QVERIFY(!store.run(std::make_shared<MoveDirItem>(DirItemKind::Folder, inner, "")).error);
+}
+
+void tst_Store::deletingFolderDeletesItsObjects()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string outer = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "Outer")));
+    const std::string inner = folderIdOf(store.run(std::make_shared<CreateFolder>(type, outer, "Inner")));
+    auto nested = makeTemplate("Nested");
+    auto kept = makeTemplate("Kept");
+    QVERIFY(store.save(nested, &inner));
+    const std::string topLevel;
+    QVERIFY(store.save(kept, &topLevel));
+
+    QVERIFY(!store.run(std::make_shared<DeleteDirItems>(std::vector<std::string>{outer}, std::vector<std::string>{})).error);
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(type);
+    get->setId(nested->id());
+    QVERIFY(store.run(get).error);
+    QVERIFY(store.fetch(type, kept->id()));
+    const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(
+        store.run(std::make_shared<GetDirectoryTree>(type)).response);
+    QVERIFY(tree);
+    QVERIFY(tree->folders().empty());
+    QCOMPARE(tree->entries().size(), size_t(1));
+}
+
+QTEST_GUILESS_MAIN(tst_Store)
+#include "tst_store.moc"

@@ -1,0 +1,207 @@
+#include "TempStore.h"
+
+#include "DirEntryBrowserWidget.h"
+#include "DirEntryTreeModel.h"
+#include "PellamSettingsKeys.h"
+#include "PellamWidget.h"
+#include "QCJobTemplate.h"
+#include "QCJobTemplateDetailWidget.h"
+#include "QCJobTemplateModel.h"
+#include "SchematicImage.h"
+#include "SettingsManager.h"
+#include "Standard.h"
+
+#include <QAction>
+#include <QLabel>
+#include <QSplitter>
+#include <QStackedWidget>
+#include <QTreeView>
+#include <QtTest>
+
+using namespace vemi;
+using Node = BaseObjectTreeModel::Node;
+using DirEntryNode = DirEntryTreeModel::DirEntryNode;
+
+namespace {
+
+std::unique_ptr<Node> entryNodeHolding(std::shared_ptr<NamedObject> object)
+{
+    auto node = std::make_unique<DirEntryNode>(nullptr, std::string());
+    node->setObject(std::move(object));
+    return node;
+}
+
+std::unique_ptr<Node> folderNode()
+{
+    return std::make_unique<DirEntryTreeModel::FolderNode>(DirFolder{"f", "", "Folder", QCJobTemplate::typeId()});
+}
+
+} // namespace
+
+class tst_PellamWidget : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void cleanup();
+    void firstStartShowsPlaceholderWithDefaultSizes();
+    void splitterLayoutSurvivesRestart();
+    void selectionDecidesPageAndTemplate_data();
+    void selectionDecidesPageAndTemplate();
+    void newTemplateIsNamedAndBecomesModelsTemplate();
+    void editorModificationReachesBrowser();
+
+private:
+    PellamWidget* createWidget();
+    void select(const std::vector<Node*>& nodes);
+    QStackedWidget* pages() const { return m_widget->findChild<QStackedWidget*>(); }
+
+    std::unique_ptr<TempStore> m_store;
+    std::unique_ptr<QWidget> m_host;
+    PellamWidget* m_widget = nullptr;
+};
+
+void tst_PellamWidget::init()
+{
+    QSettings().clear();
+    m_store = std::make_unique<TempStore>();
+    m_host = std::make_unique<QWidget>();
+    m_widget = createWidget();
+}
+
+void tst_PellamWidget::cleanup()
+{
+    m_host.reset();
+    m_store.reset();
+}
+
+PellamWidget* tst_PellamWidget::createWidget()
+{
+    auto* widget = new PellamWidget(nullptr, SettingsManager::instance().getGeneralSettings(), m_store->model(),
+                                    m_host.get());
+    widget->resize(1400 + widget->findChild<QSplitter*>()->handleWidth(), 600);
+    return widget;
+}
+
+void tst_PellamWidget::select(const std::vector<Node*>& nodes)
+{
+    QMetaObject::invokeMethod(m_widget, "onSelectionChanged",
+                              Q_ARG(QVector<vemi::BaseObjectTreeModel::Node*>,
+                                    QVector<Node*>(nodes.begin(), nodes.end())));
+}
+
+void tst_PellamWidget::firstStartShowsPlaceholderWithDefaultSizes()
+{
+    m_host->resize(m_widget->size());
+    m_host->show();
+    QVERIFY(QTest::qWaitForWindowExposed(m_host.get()));
+    const QList<int> sizes = m_widget->findChild<QSplitter*>()->sizes();
+    QCOMPARE(sizes.size(), 2);
+    // Qt clamps sizes set before the first show to the widgets' size hints;
+    // what must hold is that the editor gets by far the larger share.
+    QVERIFY2(sizes[1] >= 4 * sizes[0], qPrintable(QStringLiteral("%1 %2").arg(sizes[0]).arg(sizes[1])));
+    QCOMPARE(pages()->currentIndex(), 0);
+    auto* placeholder = qobject_cast<QLabel*>(pages()->widget(0));
+    QVERIFY(placeholder);
+    QCOMPARE(placeholder->text(), QStringLiteral("Please create a new job template or open an existing one."));
+    QCOMPARE(placeholder->alignment(), Qt::AlignCenter);
+}
+
+void tst_PellamWidget::splitterLayoutSurvivesRestart()
+{
+    m_widget->findChild<QSplitter*>()->setSizes({300, 400});
+    const QByteArray state = m_widget->findChild<QSplitter*>()->saveState();
+    delete m_widget;
+    QCOMPARE(QSettings().value(PellamKeys::MainSplitterState).toByteArray(), state);
+
+    m_widget = createWidget();
+    QCOMPARE(m_widget->findChild<QSplitter*>()->saveState(), state);
+}
+
+void tst_PellamWidget::selectionDecidesPageAndTemplate_data()
+{
+    QTest::addColumn<QString>("selection");
+    QTest::addColumn<int>("page");
+    QTest::addColumn<bool>("templateLoaded");
+    QTest::newRow("nothing shows the placeholder") << "none" << 0 << false;
+    QTest::newRow("two templates show the placeholder") << "two" << 0 << false;
+    QTest::newRow("a folder shows the placeholder") << "folder" << 0 << false;
+    QTest::newRow("one template opens it in the editor") << "one" << 1 << true;
+    QTest::newRow("an entry of another type keeps the editor as it was") << "standard" << 1 << false;
+}
+
+void tst_PellamWidget::selectionDecidesPageAndTemplate()
+{
+    QFETCH(QString, selection);
+    QFETCH(int, page);
+    QFETCH(bool, templateLoaded);
+    auto previous = std::make_shared<QCJobTemplate>();
+    m_widget->model()->setJobTemplate(previous);
+    QSignalSpy loaded(m_widget->model().get(), &QCJobTemplateModel::sgMeasurementConfigLoaded);
+
+    auto opened = std::make_shared<QCJobTemplate>();
+    opened->setName("Door Panel");
+    auto one = entryNodeHolding(opened);
+    auto two = entryNodeHolding(std::make_shared<QCJobTemplate>());
+    auto folder = folderNode();
+    auto standard = entryNodeHolding(std::make_shared<Standard>());
+    const std::map<QString, std::vector<Node*>> selections = {
+        {"none", {}}, {"two", {one.get(), two.get()}}, {"folder", {folder.get()}},
+        {"one", {one.get()}}, {"standard", {standard.get()}}};
+    select(selections.at(selection));
+
+    QCOMPARE(pages()->currentIndex(), page);
+    QCOMPARE(m_widget->model()->jobTemplate(), templateLoaded ? opened : previous);
+    QCOMPARE(loaded.count(), templateLoaded ? 1 : 0);
+    const QString heading = m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->text();
+    QCOMPARE(heading == QStringLiteral("Door Panel"), templateLoaded);
+}
+
+void tst_PellamWidget::newTemplateIsNamedAndBecomesModelsTemplate()
+{
+    auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
+    QVERIFY(browser);
+    QTRY_VERIFY(browser->treeModel()->rowCount() == 0);
+    auto first = std::dynamic_pointer_cast<QCJobTemplate>(m_widget->newNamedObject());
+    QVERIFY(first);
+    QCOMPARE(first->name(), std::string("Job Template"));
+    QCOMPARE(m_widget->model()->jobTemplate(), first);
+    QVERIFY(first->schematicImage());
+    QVERIFY(first->schematicImage()->imageData().empty());
+    QCOMPARE(m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->text(),
+             QStringLiteral("Job Template"));
+
+    browser->actionNew()->trigger();
+    QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
+    QCOMPARE(browser->treeModel()->root()->children().front()->displayName(), QStringLiteral("Job Template"));
+    QVERIFY(browser->treeModel()->root()->children().front()->isModified());
+    browser->actionNew()->trigger();
+    QCOMPARE(browser->treeModel()->rowCount(), 2);
+    QCOMPARE(browser->treeModel()->root()->children().back()->displayName(), QStringLiteral("Job Template 2"));
+}
+
+void tst_PellamWidget::editorModificationReachesBrowser()
+{
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setName("Door Panel");
+    const std::string topLevel;
+    QVERIFY(m_store->save(jobTemplate, &topLevel));
+    delete m_widget;
+    m_widget = createWidget();
+    auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
+    QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
+    Node* node = browser->treeModel()->root()->children().front().get();
+    browser->treeView()->selectionModel()->setCurrentIndex(browser->treeModel()->indexFromNode(node),
+                                                           QItemSelectionModel::ClearAndSelect);
+    QTRY_COMPARE(pages()->currentIndex(), 1);
+    QVERIFY(!node->isModified());
+
+    auto open = std::dynamic_pointer_cast<QCJobTemplate>(node->object());
+    emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
+    QVERIFY(node->isModified());
+    QVERIFY(browser->actionSave()->isEnabled());
+}
+
+QTEST_MAIN(tst_PellamWidget)
+#include "tst_pellamwidget.moc"
