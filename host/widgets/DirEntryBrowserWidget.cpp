@@ -96,8 +96,10 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
 
     const std::string remembered = QSettings().value(m_settingsKey).toString().toStdString();
     m_model->load([this, remembered](bool ok) {
-        if (ok)
-            restoreSelection({remembered});
+        if (!ok)
+            return;
+        m_tree->expandToDepth(0);
+        restoreSelection({remembered});
     });
 }
 
@@ -315,7 +317,10 @@ void DirEntryBrowserWidget::saveCurrentObject()
     if (!node || !node->object() || !node->isModified())
         return;
     m_actionSave->setEnabled(false);
-    m_model->saveObject(node, [this](bool) { updateActions(); });
+    m_model->saveObject(node, [this](bool) {
+        rememberSelection();
+        updateActions();
+    });
 }
 
 bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)

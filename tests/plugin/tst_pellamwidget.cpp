@@ -2,6 +2,7 @@
 
 #include "DirEntryBrowserWidget.h"
 #include "DirEntryTreeModel.h"
+#include "PellamSettings.h"
 #include "PellamSettingsKeys.h"
 #include "PellamWidget.h"
 #include "QCJobTemplate.h"
@@ -51,6 +52,7 @@ private slots:
     void selectionDecidesPageAndTemplate();
     void newTemplateIsNamedAndBecomesModelsTemplate();
     void editorModificationReachesBrowser();
+    void settingsObjectIsCommonSettings();
 
 private:
     PellamWidget* createWidget();
@@ -201,6 +203,17 @@ void tst_PellamWidget::editorModificationReachesBrowser()
     emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
     QVERIFY(node->isModified());
     QVERIFY(browser->actionSave()->isEnabled());
+}
+
+void tst_PellamWidget::settingsObjectIsCommonSettings()
+{
+    PellamSettings settings(QStringLiteral("QC Job Template Editor"));
+    QCOMPARE(settings.qt_metacast("vemi::PellamSettings"), static_cast<void*>(&settings));
+    QCOMPARE(settings.qt_metacast("CommonSettings"), static_cast<void*>(static_cast<CommonSettings*>(&settings)));
+    QCOMPARE(settings.settingsName(), std::string("QC Job Template Editor"));
+    QCOMPARE(settings.title(), settings.settingsName());
+    QVERIFY(settings.isUserVisible());
+    QVERIFY(!settings.isExpertOnly());
 }
 
 QTEST_MAIN(tst_PellamWidget)
