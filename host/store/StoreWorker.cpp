@@ -53,6 +53,9 @@ void StoreWorker::run(std::shared_ptr<QtCommand> command)
         command->postError(std::make_shared<ErrorInfo>(
             QStringLiteral("Cannot %1: the stored object is damaged (%2): %3")
                 .arg(QString::fromStdString(what), QString::fromUtf8(error.what()), m_path)));
+    } catch (const std::exception& error) {
+        command->postError(std::make_shared<ErrorInfo>(
+            QStringLiteral("Cannot %1: %2").arg(QString::fromStdString(what), QString::fromUtf8(error.what()))));
     }
 }
 

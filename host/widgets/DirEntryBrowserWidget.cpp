@@ -12,6 +12,7 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMessageBox>
+#include <QPointer>
 #include <QSettings>
 #include <QTreeView>
 #include <QVBoxLayout>
@@ -95,8 +96,8 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
 
     const std::string remembered = QSettings().value(m_settingsKey).toString().toStdString();
-    m_model->load([this, remembered](bool ok) {
-        if (!ok)
+    m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this), remembered](bool ok) {
+        if (!self || !ok)
             return;
         m_tree->expandToDepth(0);
         restoreSelection({remembered});
@@ -159,8 +160,8 @@ void DirEntryBrowserWidget::onTreeSelectionChanged()
 {
     const quint64 generation = ++m_selectionGeneration;
     auto pending = std::make_shared<int>(1);
-    const auto finishOne = [this, pending, generation](bool) {
-        if (--*pending == 0)
+    const auto finishOne = [this, self = QPointer<DirEntryBrowserWidget>(this), pending, generation](bool) {
+        if (--*pending == 0 && self)
             emitSelection(generation);
     };
     for (Node* node : selectedNodes()) {
@@ -317,7 +318,9 @@ void DirEntryBrowserWidget::saveCurrentObject()
     if (!node || !node->object() || !node->isModified())
         return;
     m_actionSave->setEnabled(false);
-    m_model->saveObject(node, [this](bool) {
+    m_model->saveObject(node, [this, self = QPointer<DirEntryBrowserWidget>(this)](bool) {
+        if (!self)
+            return;
         rememberSelection();
         updateActions();
     });
@@ -375,8 +378,8 @@ void DirEntryBrowserWidget::refresh()
     if (!m_model)
         return;
     const std::vector<std::string> keys = selectionKeys();
-    m_model->load([this, keys](bool ok) {
-        if (ok)
+    m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this), keys](bool ok) {
+        if (self && ok)
             restoreSelection(keys);
     });
 }

@@ -49,6 +49,14 @@ struct Browser
         }
         return nullptr;
     }
+    // Waits for the node of name, selects it and waits for its object.
+    bool openLoaded(const QString& name)
+    {
+        if (!QTest::qWaitFor([&] { return find(name) != nullptr; }, 10000))
+            return false;
+        select(find(name));
+        return QTest::qWaitFor([&] { return find(name)->object() != nullptr; }, 10000);
+    }
     void select(Node* node)
     {
         widget.treeView()->selectionModel()->setCurrentIndex(model.indexFromNode(node),
@@ -155,9 +163,7 @@ void tst_DirEntryBrowser::modifiedObjectEnablesSave()
     TempStore store;
     storeTemplate(store, "Door Panel", "");
     Browser browser(store);
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
-    browser.select(browser.find(QStringLiteral("Door Panel")));
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     QVERIFY(!browser.widget.actionSave()->isEnabled());
 
     auto object = browser.find(QStringLiteral("Door Panel"))->object();
@@ -176,9 +182,7 @@ void tst_DirEntryBrowser::failedSaveKeepsObjectModified()
     readOnly.readOnly = true;
     store.reopen(readOnly);
     Browser browser(store);
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
-    browser.select(browser.find(QStringLiteral("Door Panel")));
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Door Panel"))->object());
 
     browser.widget.actionSave()->trigger();
@@ -232,9 +236,7 @@ void tst_DirEntryBrowser::mayCloseAsksOnlyAboutUnsavedWork()
     TempStore store;
     storeTemplate(store, "Door Panel", "");
     Browser browser(store);
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
-    browser.select(browser.find(QStringLiteral("Door Panel")));
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel"))->object());
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     auto jobTemplate = std::dynamic_pointer_cast<QCJobTemplate>(browser.find(QStringLiteral("Door Panel"))->object());
     if (modified) {
         jobTemplate->setDescription("edited");
