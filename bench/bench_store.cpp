@@ -11,7 +11,6 @@
 #include "GetMarloObject.h"
 #include "GetMarloObjectResponse.h"
 #include "MarloModel.h"
-#include "ObjectCodec.h"
 #include "QCJobTemplate.h"
 #include "QtCommand.h"
 #include "SchematicImage.h"
@@ -27,6 +26,7 @@
 #include <QTimer>
 
 #include <algorithm>
+#include <array>
 #include <cstdio>
 #include <cstring>
 #include <map>
@@ -42,14 +42,18 @@ constexpr double kRatioGoal = 1.50;
 constexpr double kStallGoalPercent = 5.0;
 constexpr int kStallSaves = 10;
 constexpr int kAnswerTimeoutMs = 60'000;
+// Repetitions of the two save+fetch benchmarks, interleaved at random so that
+// a load spike from another process does not fall on one side only.
+constexpr int kRepetitions = 6;
+constexpr double kMinSecondsPerRepetition = 0.5;
 
 const char* const kStoreBenchmark = "store_save_fetch_10MB";
 const char* const kRawBenchmark = "raw_sqlite_blob_write_read_10MB";
 
 // Random bytes do not compress, so neither side can profit from the content.
-std::vector<unsigned char> incompressibleBytes(std::size_t size)
+std::vector<unsigned char> incompressibleBytes(std::size_t size, std::uint64_t seed)
 {
-    std::mt19937_64 generator(0x5eed5eedULL);
+    std::mt19937_64 generator(seed);
     std::vector<unsigned char> bytes(size);
     std::size_t offset = 0;
     while (offset < size) {
@@ -61,16 +65,21 @@ std::vector<unsigned char> incompressibleBytes(std::size_t size)
     return bytes;
 }
 
-std::shared_ptr<vemi::QCJobTemplate> templateWithSchematic(std::vector<unsigned char> imageData)
+std::shared_ptr<vemi::SchematicImage> schematicOf(std::vector<unsigned char> imageData)
 {
     auto image = std::make_shared<vemi::SchematicImage>();
     image->setName("part");
     image->setOriginalFilename("part.png");
     image->setFormat("png");
     image->setImageData(std::move(imageData));
+    return image;
+}
+
+std::shared_ptr<vemi::QCJobTemplate> templateWithSchematic(std::shared_ptr<vemi::SchematicImage> image)
+{
     auto jobTemplate = std::make_shared<vemi::QCJobTemplate>();
     jobTemplate->setName("Benchmark template");
-    jobTemplate->setSchematicImage(image);
+    jobTemplate->setSchematicImage(std::move(image));
     return jobTemplate;
 }
 
@@ -140,7 +149,8 @@ public:
         if (sqlite3_exec(m_db, setup, nullptr, nullptr, nullptr) != SQLITE_OK)
             return failure("set up");
         if (!prepare("BEGIN IMMEDIATE", &m_begin) || !prepare("COMMIT", &m_commit)
-            || !prepare("INSERT OR REPLACE INTO blobs(id, data) VALUES(?, ?)", &m_insert)
+            || !prepare("INSERT INTO blobs(id, data) VALUES(?, ?)"
+                                 " ON CONFLICT(id) DO UPDATE SET data = excluded.data", &m_insert)
             || !prepare("SELECT data FROM blobs WHERE id = ?", &m_select))
             return failure("prepare");
         return {};
@@ -203,7 +213,8 @@ private:
 };
 
 // Prints as the console reporter does and keeps the mean real time per
-// iteration of each benchmark, so that ratios can be printed afterwards.
+// iteration of each benchmark (averaged over its repetitions), so that ratios
+// can be printed afterwards.
 class RecordingReporter : public benchmark::ConsoleReporter
 {
 public:
@@ -235,10 +246,16 @@ private:
     std::map<std::string, Totals> m_totals;
 };
 
+// Both sides write the same kind of statement and alternate between two
+// payloads: SQLite skips pages whose bytes an update leaves unchanged, so
+// writing the same bytes again would measure almost nothing.
 void storeSaveAndFetch(benchmark::State& state, vemi::CommandDispatcher* dispatcher,
-                       std::shared_ptr<vemi::QCJobTemplate> jobTemplate)
+                       std::shared_ptr<vemi::QCJobTemplate> jobTemplate,
+                       std::array<std::shared_ptr<vemi::SchematicImage>, 2> images)
 {
+    std::size_t round = 0;
     for (auto _ : state) {
+        jobTemplate->setSchematicImage(images[round++ % 2]);
         const Answer saved = runCommand(*dispatcher, saveCommand(jobTemplate));
         if (!saved.response) {
             state.SkipWithError(qPrintable(saved.error));
@@ -260,11 +277,13 @@ void storeSaveAndFetch(benchmark::State& state, vemi::CommandDispatcher* dispatc
     state.SetBytesProcessed(std::int64_t(state.iterations()) * 2 * std::int64_t(kSchematicBytes));
 }
 
-void rawBlobWriteAndRead(benchmark::State& state, RawBlobStore* raw, const std::vector<unsigned char>* data)
+void rawBlobWriteAndRead(benchmark::State& state, RawBlobStore* raw,
+                         std::array<const std::vector<unsigned char>*, 2> payloads)
 {
     const std::string id = "blob";
+    std::size_t round = 0;
     for (auto _ : state) {
-        std::string error = raw->write(id, *data);
+        std::string error = raw->write(id, *payloads[round++ % 2]);
         std::vector<unsigned char> copy;
         if (error.empty())
             error = raw->read(id, copy);
@@ -277,35 +296,18 @@ void rawBlobWriteAndRead(benchmark::State& state, RawBlobStore* raw, const std::
     state.SetBytesProcessed(std::int64_t(state.iterations()) * 2 * std::int64_t(kSchematicBytes));
 }
 
-// The caller-thread pieces of a save and a fetch, to see where a change helps.
-void serializeTemplate(benchmark::State& state, std::shared_ptr<vemi::QCJobTemplate> jobTemplate)
-{
-    for (auto _ : state) {
-        const QByteArray bytes = vemi::ObjectCodec::serialize(*jobTemplate);
-        benchmark::DoNotOptimize(bytes.constData());
-    }
-}
-
-void deserializeTemplate(benchmark::State& state, std::shared_ptr<vemi::QCJobTemplate> jobTemplate)
-{
-    const QByteArray bytes = vemi::ObjectCodec::serialize(*jobTemplate);
-    for (auto _ : state) {
-        const auto object = vemi::ObjectCodec::deserialize(bytes);
-        benchmark::DoNotOptimize(object.get());
-    }
-}
-
 struct StallSample
 {
     qint64 saveNs = 0;
+    qint64 dispatchNs = 0;
     qint64 longestGapNs = 0;
     QString error;
 };
 
 // A zero-interval timer ticks whenever the event loop is free; the longest
 // gap between ticks from the dispatch to the answer is the worst stall a user
-// would feel. The gap that holds dispatch() itself counts too, since the
-// object is encoded on the caller's thread.
+// would feel. The gap that holds dispatch() itself counts too: dispatch()
+// runs on the caller's thread and takes the command's snapshot there.
 StallSample measureSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<vemi::BaseObject>& object)
 {
     constexpr int kTicksBeforeDispatch = 20;
@@ -339,6 +341,7 @@ StallSample measureSaveStall(vemi::CommandDispatcher& dispatcher, const std::sha
         if (++ticks == kTicksBeforeDispatch) {
             dispatchedAt = now;
             dispatcher.dispatch(wrapper);
+            sample.dispatchNs = clock.nsecsElapsed() - now;
         }
     });
     QTimer::singleShot(kAnswerTimeoutMs, &loop, [&]() {
@@ -360,13 +363,17 @@ T median(std::vector<T> values)
     return values.size() % 2 ? values[middle] : (values[middle - 1] + values[middle]) / 2;
 }
 
-bool reportSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<vemi::BaseObject>& object)
+// Alternates the schematic between saves, so that every save writes all its pages.
+bool reportSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<vemi::QCJobTemplate>& jobTemplate,
+                     const std::array<std::shared_ptr<vemi::SchematicImage>, 2>& images)
 {
     std::vector<double> shares;
     std::vector<double> gapsMs;
     std::vector<double> savesMs;
+    std::vector<double> dispatchesMs;
     for (int i = 0; i < kStallSaves; ++i) {
-        const StallSample sample = measureSaveStall(dispatcher, object);
+        jobTemplate->setSchematicImage(images[size_t(i) % 2]);
+        const StallSample sample = measureSaveStall(dispatcher, jobTemplate);
         if (!sample.error.isEmpty()) {
             std::fprintf(stderr, "event-loop stall: %s\n", qPrintable(sample.error));
             return false;
@@ -374,12 +381,13 @@ bool reportSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<
         shares.push_back(100.0 * double(sample.longestGapNs) / double(sample.saveNs));
         gapsMs.push_back(double(sample.longestGapNs) / 1e6);
         savesMs.push_back(double(sample.saveNs) / 1e6);
+        dispatchesMs.push_back(double(sample.dispatchNs) / 1e6);
     }
     std::printf("longest event-loop stall during a 10 MB save: %.1f %% of the save (goal <= %.0f %%)\n",
                 median(shares), kStallGoalPercent);
-    std::printf("  median over %d saves: longest stall %.2f ms, save %.2f ms"
+    std::printf("  median over %d saves: longest stall %.2f ms, save %.2f ms, of which dispatch() %.2f ms"
                 " (stall range %.2f-%.2f ms, save range %.2f-%.2f ms)\n",
-                kStallSaves, median(gapsMs), median(savesMs),
+                kStallSaves, median(gapsMs), median(savesMs), median(dispatchesMs),
                 *std::min_element(gapsMs.begin(), gapsMs.end()), *std::max_element(gapsMs.begin(), gapsMs.end()),
                 *std::min_element(savesMs.begin(), savesMs.end()), *std::max_element(savesMs.begin(), savesMs.end()));
     return true;
@@ -389,11 +397,18 @@ bool reportSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<
 
 int main(int argc, char** argv)
 {
+    // Interleaving is on unless the command line turns it off (a later flag wins).
+    char interleave[] = "--benchmark_enable_random_interleaving=true";
+    std::vector<char*> arguments{argv[0], interleave};
+    arguments.insert(arguments.end(), argv + 1, argv + argc);
+    arguments.push_back(nullptr);
+    int argumentCount = int(arguments.size()) - 1;
+
     // Google Benchmark takes its own flags out before Qt sees the rest.
-    benchmark::Initialize(&argc, argv);
-    if (benchmark::ReportUnrecognizedArguments(argc, argv))
+    benchmark::Initialize(&argumentCount, arguments.data());
+    if (benchmark::ReportUnrecognizedArguments(argumentCount, arguments.data()))
         return 1;
-    QCoreApplication app(argc, argv);
+    QCoreApplication app(argumentCount, arguments.data());
 
     QTemporaryDir folder;
     if (!folder.isValid()) {
@@ -415,21 +430,20 @@ int main(int argc, char** argv)
         return 1;
     }
 
-    const std::vector<unsigned char> schematic = incompressibleBytes(kSchematicBytes);
-    const auto jobTemplate = templateWithSchematic(schematic);
+    const std::vector<unsigned char> first = incompressibleBytes(kSchematicBytes, 0x5eed5eedULL);
+    const std::vector<unsigned char> second = incompressibleBytes(kSchematicBytes, 0xfeedf00dULL);
+    const std::array<std::shared_ptr<vemi::SchematicImage>, 2> images = {schematicOf(first), schematicOf(second)};
+    const auto jobTemplate = templateWithSchematic(images[0]);
 
-    benchmark::RegisterBenchmark(kStoreBenchmark, storeSaveAndFetch, dispatcher.get(), jobTemplate)
-        ->Unit(benchmark::kMillisecond)
-        ->UseRealTime();
-    benchmark::RegisterBenchmark(kRawBenchmark, rawBlobWriteAndRead, &raw, &schematic)
-        ->Unit(benchmark::kMillisecond)
-        ->UseRealTime();
-    benchmark::RegisterBenchmark("codec_serialize_template_10MB", serializeTemplate, jobTemplate)
-        ->Unit(benchmark::kMillisecond)
-        ->UseRealTime();
-    benchmark::RegisterBenchmark("codec_deserialize_template_10MB", deserializeTemplate, jobTemplate)
-        ->Unit(benchmark::kMillisecond)
-        ->UseRealTime();
+    for (benchmark::internal::Benchmark* registered :
+         {benchmark::RegisterBenchmark(kStoreBenchmark, storeSaveAndFetch, dispatcher.get(), jobTemplate, images),
+          benchmark::RegisterBenchmark(kRawBenchmark, rawBlobWriteAndRead, &raw,
+                                       std::array<const std::vector<unsigned char>*, 2>{&first, &second})}) {
+        registered->Unit(benchmark::kMillisecond)
+            ->UseRealTime()
+            ->Repetitions(kRepetitions)
+            ->MinTime(kMinSecondsPerRepetition);
+    }
 
     RecordingReporter reporter;
     benchmark::RunSpecifiedBenchmarks(&reporter);
@@ -443,7 +457,7 @@ int main(int argc, char** argv)
     else
         std::printf("store save+fetch / raw SQLite blob: not measured (filtered out or failed)\n");
 
-    const bool stallMeasured = reportSaveStall(*dispatcher, jobTemplate);
+    const bool stallMeasured = reportSaveStall(*dispatcher, jobTemplate, images);
     benchmark::Shutdown();
     return stallMeasured ? 0 : 1;
 }

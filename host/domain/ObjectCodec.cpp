@@ -1,5 +1,6 @@
 #include "ObjectCodec.h"
 
+#include "CborStream.h"
 #include "Header.h"
 #include "ObjectRegistry.h"
 
@@ -57,18 +58,24 @@ std::shared_ptr<BaseObject> ObjectCodec::decode(const QCborValue& value)
     return object;
 }
 
+ObjectSnapshot ObjectCodec::snapshot(const BaseObject& object)
+{
+    ObjectSnapshot snapshot;
+    DetachedBytes::Scope scope(snapshot.bytes);
+    snapshot.tree = encode(object);
+    return snapshot;
+}
+
 QByteArray ObjectCodec::serialize(const BaseObject& object)
 {
-    return encode(object).toCbor();
+    return snapshot(object).toCbor();
 }
 
 std::shared_ptr<BaseObject> ObjectCodec::deserialize(const QByteArray& bytes)
 {
-    QCborParserError error;
-    const QCborValue value = QCborValue::fromCbor(bytes, &error);
-    if (error.error != QCborError::NoError)
-        throw DecodeError("invalid CBOR at byte " + std::to_string(error.offset) + ": "
-                          + error.errorString().toStdString());
+    DetachedBytes table;
+    const QCborValue value = CborStream::read(bytes, table);
+    DetachedBytes::Scope scope(table);
     auto object = decode(value);
     if (!object)
         throw DecodeError("stored value is empty");
@@ -80,9 +87,13 @@ QCborValue ObjectCodec::text(const std::string& value)
     return QCborValue(QString::fromStdString(value));
 }
 
-QCborValue ObjectCodec::bytes(const std::vector<unsigned char>& value)
+QCborValue ObjectCodec::bytes(const SharedBytes& value)
 {
-    return QCborValue(QByteArray(reinterpret_cast<const char*>(value.data()), int(value.size())));
+    if (DetachedBytes* table = DetachedBytes::current())
+        return table->add(value);
+    if (!value)
+        return QCborValue(QByteArray());
+    return QCborValue(QByteArray(reinterpret_cast<const char*>(value->data()), int(value->size())));
 }
 
 QCborArray ObjectCodec::textList(const std::vector<std::string>& values)
@@ -121,12 +132,18 @@ bool ObjectCodec::readBool(const QCborMap& map, const QString& key, bool fallbac
     return value.toBool(fallback);
 }
 
-std::vector<unsigned char> ObjectCodec::readBytes(const QCborMap& map, const QString& key)
+SharedBytes ObjectCodec::readBytes(const QCborMap& map, const QString& key)
 {
     const QCborValue value = map.value(key);
+    if (DetachedBytes::isPlaceholder(value)) {
+        if (!DetachedBytes::current())
+            throw DecodeError("field \"" + key.toStdString() + "\" refers to bytes that are not there");
+        return DetachedBytes::current()->bytesOf(value);
+    }
     requireKind(value, value.isByteArray(), key, "a byte string");
     const QByteArray data = value.toByteArray();
-    return std::vector<unsigned char>(data.begin(), data.end());
+    const auto* begin = reinterpret_cast<const unsigned char*>(data.constData());
+    return std::make_shared<const std::vector<unsigned char>>(begin, begin + data.size());
 }
 
 std::vector<std::string> ObjectCodec::readTextList(const QCborMap& map, const QString& key)

@@ -2,6 +2,8 @@
 
 #include "BaseObject.h"
 #include "DecodeError.h"
+#include "ObjectSnapshot.h"
+#include "SharedBytes.h"
 
 #include <QByteArray>
 #include <QCborArray>
@@ -17,7 +19,8 @@ namespace vemi {
 // Turns domain objects into CBOR and back. An object is a map with "type",
 // "id", "header" and its class's fields; nested objects are maps of their own,
 // so a template travels with everything it holds. Byte fields are CBOR byte
-// strings, so image data is stored as it is. Decoding throws DecodeError.
+// strings, so image data is stored as it is; they are shared, never copied,
+// between objects, snapshots and clones. Decoding throws DecodeError.
 class ObjectCodec
 {
 public:
@@ -26,14 +29,18 @@ public:
     // An empty handle for CBOR null; throws for anything else that is not an object.
     static std::shared_ptr<BaseObject> decode(const QCborValue& value);
 
+    // Cheap: copies no byte field. The object may change afterwards.
+    static ObjectSnapshot snapshot(const BaseObject& object);
     static QByteArray serialize(const BaseObject& object);
     static std::shared_ptr<BaseObject> deserialize(const QByteArray& bytes);
 
-    // A deep copy that keeps every id.
+    // A deep copy that keeps every id (and shares the immutable byte fields).
     template <class T>
     static std::shared_ptr<T> clone(const T& object)
     {
-        return std::dynamic_pointer_cast<T>(decode(encode(object)));
+        ObjectSnapshot copy = snapshot(object);
+        DetachedBytes::Scope scope(copy.bytes);
+        return std::dynamic_pointer_cast<T>(decode(copy.tree));
     }
 
     template <class T>
@@ -73,7 +80,7 @@ public:
     }
 
     static QCborValue text(const std::string& value);
-    static QCborValue bytes(const std::vector<unsigned char>& value);
+    static QCborValue bytes(const SharedBytes& value);
     static QCborArray textList(const std::vector<std::string>& values);
 
     // Field readers: a missing field gives the default; a field of the wrong kind throws.
@@ -81,7 +88,8 @@ public:
     static qint64 readInteger(const QCborMap& map, const QString& key, qint64 fallback = 0);
     static double readDouble(const QCborMap& map, const QString& key, double fallback = 0.0);
     static bool readBool(const QCborMap& map, const QString& key, bool fallback = false);
-    static std::vector<unsigned char> readBytes(const QCborMap& map, const QString& key);
+    // Never null: a missing field gives empty bytes.
+    static SharedBytes readBytes(const QCborMap& map, const QString& key);
     static std::vector<std::string> readTextList(const QCborMap& map, const QString& key);
 };
 

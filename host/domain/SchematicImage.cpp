@@ -28,9 +28,20 @@ void SchematicImage::setName(const std::string& name)
     header()->setName(name);
 }
 
+SchematicImage::SchematicImage()
+    : m_imageData(std::make_shared<const std::vector<unsigned char>>())
+{
+}
+
+const std::vector<unsigned char>& SchematicImage::imageData() const
+{
+    return *m_imageData;
+}
+
+// The bytes are never changed in place, so snapshots and clones may share them.
 void SchematicImage::setImageData(std::vector<unsigned char> data)
 {
-    m_imageData = std::move(data);
+    m_imageData = std::make_shared<const std::vector<unsigned char>>(std::move(data));
 }
 
 void SchematicImage::writeFields(QCborMap& map) const

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "BaseObject.h"
+#include "SharedBytes.h"
 
 namespace vemi {
 
@@ -9,6 +10,8 @@ namespace vemi {
 class SchematicImage : public BaseObject
 {
 public:
+    SchematicImage();
+
     static const std::string& typeId();
     std::string objectTypeId() const override;
 
@@ -19,8 +22,10 @@ public:
     void setOriginalFilename(const std::string& filename) { m_originalFilename = filename; }
     std::string format() const { return m_format; }
     void setFormat(const std::string& format) { m_format = format; }
-    const std::vector<unsigned char>& imageData() const { return m_imageData; }
+    const std::vector<unsigned char>& imageData() const;
     void setImageData(std::vector<unsigned char> data);
+    // The same bytes as a shared, immutable buffer: for copies that must not cost.
+    SharedBytes sharedImageData() const { return m_imageData; }
 
     void writeFields(QCborMap& map) const override;
     void readFields(const QCborMap& map) override;
@@ -28,7 +33,7 @@ public:
 private:
     std::string m_originalFilename;
     std::string m_format;
-    std::vector<unsigned char> m_imageData;
+    SharedBytes m_imageData; // never null
 };
 
 } // namespace vemi

@@ -25,7 +25,7 @@ void UpdateObject::prepare()
 {
     if (!m_object)
         return;
-    m_data = ObjectCodec::serialize(*m_object);
+    m_snapshot = ObjectCodec::snapshot(*m_object);
     m_id = m_object->id();
     m_type = m_object->objectTypeId();
     m_name = m_object->header() ? m_object->header()->name() : std::string();
@@ -33,15 +33,16 @@ void UpdateObject::prepare()
 
 std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
 {
-    if (m_data.isEmpty())
+    if (!m_snapshot)
         throw StoreError("there is no object to save");
+    const QByteArray data = m_snapshot->toCbor();
     std::shared_ptr<DirEntry> entry;
     database.writeTransaction([&] {
         database.run(QStringLiteral("INSERT INTO objects(id, type, name, data) VALUES(?, ?, ?, ?)"
                                     " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
                                     " name = excluded.name, data = excluded.data"),
                      {QString::fromStdString(m_id), QString::fromStdString(m_type),
-                      QString::fromStdString(m_name), m_data},
+                      QString::fromStdString(m_name), data},
                      "save the object");
         if (m_folderId)
             entry = fileInFolder(database);

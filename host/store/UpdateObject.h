@@ -1,8 +1,7 @@
 #pragma once
 
 #include "Command.h"
-
-#include <QByteArray>
+#include "ObjectSnapshot.h"
 
 #include <optional>
 
@@ -12,7 +11,8 @@ class BaseObject;
 class DirEntry;
 
 // Stores an object: creates it or replaces the stored one with the same id.
-// The object is serialised when the command is dispatched; later edits of
+// The object's snapshot is taken when the command is dispatched (cheap: image
+// bytes are shared, not copied) and encoded on the worker; later edits of
 // the object are not part of this write.
 class UpdateObject : public Command
 {
@@ -31,7 +31,7 @@ private:
 
     std::shared_ptr<BaseObject> m_object;
     std::optional<std::string> m_folderId;
-    QByteArray m_data;
+    std::optional<ObjectSnapshot> m_snapshot;
     std::string m_id;
     std::string m_type;
     std::string m_name;

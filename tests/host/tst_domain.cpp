@@ -211,6 +211,8 @@ private slots:
     void librariesStoreMemberIdsOnly();
     void malformedBytesThrow_data();
     void malformedBytesThrow();
+    void snapshotIsUnaffectedByLaterEdits();
+    void cloneSharesImageBytes();
 };
 
 void tst_Domain::populatedTemplateSurvivesRoundTrip()
@@ -551,12 +553,43 @@ void tst_Domain::malformedBytesThrow_data()
         << withField(ColorStandardsLibrary(), "standardIds", QCborArray{ObjectCodec::encode(*makeStandard("S"))});
     QTest::newRow("nested tag value with a wrong field")
         << withField(*jobTemplate, "tagValues", QCborArray{fieldMap(TagValue(), "value", 1.5)});
+    // Must fail cleanly rather than exhaust the stack.
+    QTest::newRow("arrays nested a thousand deep") << QByteArray(1000, '\x81') + QByteArray(1, '\x00');
+    QTest::newRow("image data holding a foreign tagged value")
+        << withField(*makeImage("i"), "imageData", QCborValue(QCborTag(0x51434A42), 0));
 }
 
 void tst_Domain::malformedBytesThrow()
 {
     QFETCH(QByteArray, bytes);
     QVERIFY_EXCEPTION_THROWN(ObjectCodec::deserialize(bytes), DecodeError);
+}
+
+void tst_Domain::snapshotIsUnaffectedByLaterEdits()
+{
+    auto jobTemplate = makeTemplate();
+    const QByteArray expected = ObjectCodec::serialize(*jobTemplate);
+    const ObjectSnapshot snapshot = ObjectCodec::snapshot(*jobTemplate);
+
+    jobTemplate->schematicImage()->setImageData({1, 2, 3});
+    jobTemplate->setName("Edited after the snapshot");
+    jobTemplate->setCheckListItems({});
+
+    QCOMPARE(snapshot.toCbor(), expected);
+}
+
+void tst_Domain::cloneSharesImageBytes()
+{
+    auto jobTemplate = makeTemplate();
+    const auto copy = ObjectCodec::clone(*jobTemplate);
+    QVERIFY(copy && copy.get() != jobTemplate.get());
+    QCOMPARE(copy->id(), jobTemplate->id());
+    QCOMPARE(copy->schematicImage()->sharedImageData(), jobTemplate->schematicImage()->sharedImageData());
+    QCOMPARE(ObjectCodec::serialize(*copy), ObjectCodec::serialize(*jobTemplate));
+
+    // Replacing the bytes of one leaves the other as it was.
+    copy->schematicImage()->setImageData({9});
+    QCOMPARE(jobTemplate->schematicImage()->imageData(), kImageBytes);
 }
 
 QTEST_APPLESS_MAIN(tst_Domain)

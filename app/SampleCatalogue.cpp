@@ -1,0 +1,319 @@
+#include "SampleCatalogue.h"
+
+#include "AppearanceValues.h"
+#include "CheckPoint.h"
+#include "CheckPointCouple.h"
+#include "ColorStandardsLibrary.h"
+#include "ColorimetricCondition.h"
+#include "LabToScreen.h"
+#include "LabToleranceBase.h"
+#include "LabValue.h"
+#include "MeasurementConfiguration.h"
+#include "ObjectCodec.h"
+#include "Position.h"
+#include "Property.h"
+#include "PropertyLibrary.h"
+#include "QCJobTemplate.h"
+#include "RGBValue.h"
+#include "SampleDrawings.h"
+#include "SchematicImage.h"
+#include "Size.h"
+#include "Standard.h"
+#include "TagDefinition.h"
+#include "TagValue.h"
+#include "ToleranceSet.h"
+
+#include <QBuffer>
+#include <QImage>
+#include <QRect>
+
+#include <map>
+
+namespace vemi {
+
+namespace {
+
+// --- Stored samples -------------------------------------------------------
+
+struct StandardPlan
+{
+    const char* name;
+    double L;
+    double a;
+    double b;
+};
+
+// In the order of SampleColour.
+const std::array<StandardPlan, SampleColourCount> kStandardPlans = {{
+    {"Ivory Beige", 82.6, 2.1, 17.9},
+    {"Graphite Grey", 33.4, -0.6, -3.2},
+    {"Signal Red", 38.2, 55.6, 33.1},
+    {"Ocean Blue", 42.1, -8.3, -31.6},
+    {"Leaf Green", 47.6, -36.2, 27.9},
+    {"Sun Yellow", 80.4, 8.7, 82.3},
+}};
+
+std::shared_ptr<Standard> makeStandard(const StandardPlan& plan, const LabToScreen& toScreen)
+{
+    auto lab = std::make_shared<LabValue>(plan.L, plan.a, plan.b);
+    lab->setColorimetricCondition(ColorimetricCondition().toString());
+    auto appearance = std::make_shared<AppearanceValues>();
+    appearance->setColorValues({lab});
+
+    const QColor colour = toScreen.convert(plan.L, plan.a, plan.b);
+    auto standard = std::make_shared<Standard>();
+    standard->setName(plan.name);
+    standard->setDescription("Interior trim colour, measured under D65/10.");
+    standard->setAppearanceValuesList({appearance});
+    standard->setDisplayRGB(std::make_shared<RGBValue>(colour.red(), colour.green(), colour.blue()));
+    return standard;
+}
+
+std::shared_ptr<TagDefinition> makeTagDefinition(const char* name, const char* description,
+                                                 const std::vector<std::string>& allowedValues = {})
+{
+    auto definition = std::make_shared<TagDefinition>();
+    definition->setName(name);
+    definition->setDescription(description);
+    definition->setAllowedValues(allowedValues);
+    if (!allowedValues.empty())
+        definition->setDefaultValue(allowedValues.front());
+    return definition;
+}
+
+std::shared_ptr<ToleranceSet> makeToleranceSet()
+{
+    auto tolerance = std::make_shared<LabToleranceBase>();
+    tolerance->setName("dE2000 1.0");
+    tolerance->setMethod("dE2000");
+    tolerance->setLimit(1.0);
+    tolerance->setColorimetricCondition(std::make_shared<ColorimetricCondition>("D65", "10"));
+
+    auto set = std::make_shared<ToleranceSet>();
+    set->setName("Automotive Interior");
+    set->setDescription("Acceptance limit for visible interior trim parts.");
+    set->setTolerances({tolerance});
+    return set;
+}
+
+std::shared_ptr<MeasurementConfiguration> makeMeasurementConfiguration()
+{
+    auto configuration = std::make_shared<MeasurementConfiguration>();
+    configuration->setName("Sphere d/8 D65/10");
+    configuration->setDescription("Sphere geometry, large area view, evaluated for D65 and the 10 degree observer.");
+    configuration->setInstrumentModel("Simulated Sphere Spectrophotometer");
+    configuration->setProperties({std::make_shared<Property>("Illuminant", "D65"),
+                                  std::make_shared<Property>("Observer", "10"),
+                                  std::make_shared<Property>("Aperture", "LAV")});
+    return configuration;
+}
+
+// --- Job templates --------------------------------------------------------
+
+// A checkpoint's area lies inside one flat region of its drawing, painted in
+// the colour of the checkpoint's standard.
+struct Spot
+{
+    const char* name;
+    QRect area;
+    SampleColour colour;
+    bool skippable;
+};
+
+struct TemplatePlan
+{
+    const char* name;
+    const char* description;
+    const char* imageName;
+    bool enableRepeat;
+    QImage (*draw)(const Palette&);
+    std::vector<SampleColour> standards;
+    std::array<const char*, 3> tagValues; // Supplier, Part Number, Material
+    std::vector<Spot> spots;
+    std::size_t coupleFirst; // this spot and the next are measured as the couple "A"
+};
+
+const std::vector<TemplatePlan>& templatePlans()
+{
+    static const std::vector<TemplatePlan> plans = {
+        {"Door Panel Trim",
+         "Colour check of the front left door trim panel before assembly. Armrest and map pocket are "
+         "measured as a pair, as they come from different moulds.",
+         "door-panel.png",
+         false,
+         &SampleDrawings::doorPanel,
+         {IvoryBeige, GraphiteGrey, OceanBlue},
+         {"Hartwell Interior Systems", "DT-4410-LH", "PP-T20"},
+         {{"Panel Surface", QRect(260, 350, 45, 35), IvoryBeige, false},
+          {"Window Sill", QRect(300, 102, 32, 32), GraphiteGrey, false},
+          {"Fabric Insert", QRect(275, 232, 50, 50), OceanBlue, true},
+          {"Armrest", QRect(540, 266, 50, 50), GraphiteGrey, false},
+          {"Map Pocket", QRect(300, 425, 50, 50), GraphiteGrey, true}},
+         3},
+        {"Dashboard Fascia",
+         "Colour check of the instrument panel fascia. The left and right decor strips are measured as "
+         "a pair to catch shade differences from side to side.",
+         "dashboard-fascia.png",
+         true,
+         &SampleDrawings::dashboard,
+         {GraphiteGrey, IvoryBeige, SignalRed},
+         {"Kestrel Moulding Ltd", "IP-2208-00", "PC/ABS"},
+         {{"Top Pad", QRect(432, 150, 36, 32), GraphiteGrey, false},
+          {"Decor Strip Left", QRect(200, 344, 30, 30), SignalRed, false},
+          {"Decor Strip Right", QRect(690, 344, 30, 30), SignalRed, false},
+          {"Glovebox Lid", QRect(620, 262, 45, 45), IvoryBeige, true}},
+         1},
+    };
+    return plans;
+}
+
+using StandardCopies = std::map<SampleColour, std::shared_ptr<Standard>>;
+
+std::vector<unsigned char> pngBytes(const QImage& image)
+{
+    QByteArray bytes;
+    QBuffer buffer(&bytes);
+    buffer.open(QIODevice::WriteOnly);
+    image.save(&buffer, "PNG");
+    return std::vector<unsigned char>(bytes.cbegin(), bytes.cend());
+}
+
+// Copies of the tag definitions, each with the plan's value.
+void addTags(QCJobTemplate& jobTemplate, const TemplatePlan& plan, const SampleCatalogue::Samples& samples)
+{
+    std::vector<std::shared_ptr<TagDefinition>> definitions;
+    std::vector<std::shared_ptr<TagValue>> values;
+    for (std::size_t i = 0; i < samples.tagDefinitions.size(); ++i) {
+        definitions.push_back(ObjectCodec::clone(*samples.tagDefinitions[i]));
+        values.push_back(TagValue::forDefinition(*definitions.back(), plan.tagValues[i]));
+    }
+    jobTemplate.setTagDefinitions(definitions);
+    jobTemplate.setTagValues(values);
+}
+
+// Copies of the plan's standards; the checkpoints take them from the result.
+StandardCopies addStandards(QCJobTemplate& jobTemplate, const TemplatePlan& plan,
+                            const SampleCatalogue::Samples& samples)
+{
+    StandardCopies copies;
+    std::vector<std::shared_ptr<Standard>> standards;
+    for (SampleColour colour : plan.standards) {
+        copies[colour] = ObjectCodec::clone(*samples.standards[colour]);
+        standards.push_back(copies[colour]);
+    }
+    jobTemplate.setStandards(standards);
+    return copies;
+}
+
+std::shared_ptr<SchematicImage> makeSchematic(const TemplatePlan& plan, const QImage& drawing)
+{
+    auto schematic = std::make_shared<SchematicImage>();
+    schematic->setName(plan.imageName);
+    schematic->setOriginalFilename(plan.imageName);
+    schematic->setFormat("png");
+    schematic->setImageData(pngBytes(drawing));
+    return schematic;
+}
+
+std::shared_ptr<CheckPoint> makeCheckPoint(const Spot& spot, const QImage& drawing, const StandardCopies& copies)
+{
+    auto cutOut = std::make_shared<SchematicImage>();
+    cutOut->setFormat("PNG");
+    cutOut->setImageData(pngBytes(drawing.copy(spot.area)));
+
+    auto checkPoint = std::make_shared<CheckPoint>();
+    checkPoint->setName(spot.name);
+    checkPoint->setPosition(std::make_shared<Position>(spot.area.x(), spot.area.y()));
+    checkPoint->setSize(std::make_shared<Size>(spot.area.width(), spot.area.height()));
+    checkPoint->setSchematicImage(cutOut);
+    checkPoint->setStandard(copies.at(spot.colour));
+    checkPoint->setAutoStandard(false);
+    checkPoint->setSkippable(spot.skippable);
+    return checkPoint;
+}
+
+std::vector<std::shared_ptr<CheckListItem>> makeCheckList(const TemplatePlan& plan, const QImage& drawing,
+                                                          const StandardCopies& copies)
+{
+    std::vector<std::shared_ptr<CheckListItem>> items;
+    for (std::size_t i = 0; i < plan.spots.size(); ++i) {
+        auto checkPoint = makeCheckPoint(plan.spots[i], drawing, copies);
+        if (i != plan.coupleFirst) {
+            items.push_back(checkPoint);
+            continue;
+        }
+        auto partner = makeCheckPoint(plan.spots[i + 1], drawing, copies);
+        checkPoint->setMatchPoint("<CP1>");
+        partner->setMatchPoint("<CP2>");
+        auto couple = std::make_shared<CheckPointCouple>();
+        couple->setName("A");
+        couple->setCheckPoints({checkPoint, partner});
+        items.push_back(couple);
+        ++i;
+    }
+    return items;
+}
+
+std::shared_ptr<QCJobTemplate> makeTemplate(const TemplatePlan& plan, const SampleCatalogue::Samples& samples)
+{
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setName(plan.name);
+    jobTemplate->setDescription(plan.description);
+    jobTemplate->setEnableRepeat(plan.enableRepeat);
+    addTags(*jobTemplate, plan, samples);
+    const StandardCopies copies = addStandards(*jobTemplate, plan, samples);
+    jobTemplate->setSharedToleranceSets({ObjectCodec::clone(*samples.toleranceSet)});
+    jobTemplate->setMeasurementConfiguration(ObjectCodec::clone(*samples.configuration));
+
+    const QImage drawing = plan.draw(samples.colours);
+    jobTemplate->setSchematicImage(makeSchematic(plan, drawing));
+    jobTemplate->setCheckListItems(makeCheckList(plan, drawing, copies));
+    return jobTemplate;
+}
+
+} // namespace
+
+SampleCatalogue::Samples SampleCatalogue::samples(const LabToScreen& toScreen)
+{
+    Samples samples;
+    for (int colour = 0; colour < SampleColourCount; ++colour) {
+        samples.standards[colour] = makeStandard(kStandardPlans[colour], toScreen);
+        const auto rgb = samples.standards[colour]->displayRGB();
+        samples.colours[colour] = QColor(rgb->red(), rgb->green(), rgb->blue());
+    }
+    samples.tagDefinitions = {makeTagDefinition("Supplier", "Company that supplies the part."),
+                              makeTagDefinition("Part Number", "Drawing number of the part."),
+                              makeTagDefinition("Material", "Base material of the measured surface.",
+                                                {"PP-T20", "PC/ABS", "ABS", "TPO"})};
+    samples.toleranceSet = makeToleranceSet();
+    samples.configuration = makeMeasurementConfiguration();
+    return samples;
+}
+
+std::shared_ptr<ColorStandardsLibrary> SampleCatalogue::standardsLibrary(const Samples& samples)
+{
+    auto library = std::make_shared<ColorStandardsLibrary>();
+    library->setName("Interior Colours");
+    library->setDescription("Standard colours of the interior trim programme.");
+    library->setStandards({samples.standards.begin(), samples.standards.end()});
+    return library;
+}
+
+std::shared_ptr<PropertyLibrary> SampleCatalogue::propertyLibrary(const Samples& samples)
+{
+    auto properties = std::make_shared<PropertyLibrary>();
+    properties->setName("Part Properties");
+    properties->setDescription("What a QC job records about the part it checks.");
+    properties->setProperties(samples.tagDefinitions);
+    return properties;
+}
+
+std::vector<std::shared_ptr<QCJobTemplate>> SampleCatalogue::jobTemplates(const Samples& samples)
+{
+    std::vector<std::shared_ptr<QCJobTemplate>> templates;
+    for (const TemplatePlan& plan : templatePlans())
+        templates.push_back(makeTemplate(plan, samples));
+    return templates;
+}
+
+} // namespace vemi
