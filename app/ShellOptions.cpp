@@ -4,6 +4,8 @@
 
 #include <QCommandLineParser>
 #include <QCoreApplication>
+#include <QFileInfo>
+#include <QRegularExpression>
 
 namespace vemi {
 
@@ -41,6 +43,24 @@ ShellOptions ShellOptions::parse(const QStringList& arguments)
     options.withSamples = !parser.isSet(noSamples) && !options.readOnly;
     options.screenshotPath = parser.value(screenshot);
     return options;
+}
+
+std::map<std::string, QString> ShellOptions::otherStoreFiles(const std::vector<std::string>& dispatcherIds,
+                                                             QStringList* refused) const
+{
+    static const QRegularExpression plainName(QStringLiteral("^\\w[\\w -]*$"));
+    const QString folder = QFileInfo(storePath).absolutePath();
+    std::map<std::string, QString> files;
+    for (const std::string& id : dispatcherIds) {
+        const QString name = QString::fromStdString(id);
+        if (id == MarloModel::defaultDispatcherId() || id.empty())
+            continue;
+        if (plainName.match(name).hasMatch())
+            files[id] = folder + QLatin1Char('/') + name + QStringLiteral(".sqlite");
+        else if (refused)
+            *refused << name;
+    }
+    return files;
 }
 
 } // namespace vemi

@@ -3,6 +3,10 @@
 #include <QString>
 #include <QStringList>
 
+#include <map>
+#include <string>
+#include <vector>
+
 namespace vemi {
 
 // The shell's command line.
@@ -16,6 +20,13 @@ struct ShellOptions
     QString error;          // why the command line was refused
 
     static ShellOptions parse(const QStringList& arguments);
+
+    // The files of the stores the user browses besides the default one: one
+    // per dispatcher id, beside the default store. Ids that are not plain
+    // names (letters, digits, blanks, dashes) are refused, so that no id can
+    // point outside that folder.
+    std::map<std::string, QString> otherStoreFiles(const std::vector<std::string>& dispatcherIds,
+                                                   QStringList* refused) const;
 };
 
 } // namespace vemi

@@ -1,7 +1,9 @@
+#include "GeneralSettings.h"
 #include "MarloModel.h"
 #include "PluginCatalog.h"
 #include "SampleData.h"
 #include "ShellOptions.h"
+#include "SettingsManager.h"
 #include "ShellWindow.h"
 
 #include <QApplication>
@@ -38,6 +40,13 @@ int main(int argc, char* argv[])
         complain(storeError);
         return 2;
     }
+    QStringList refusedIds;
+    const auto otherStores = options.otherStoreFiles(
+        vemi::SettingsManager::instance().getGeneralSettings()->dispatcherList(), &refusedIds);
+    for (const auto& [id, path] : otherStores)
+        store.addStore(id, path);
+    for (const QString& id : refusedIds)
+        complain(QStringLiteral("Ignored the store id \"%1\": use letters, digits, blanks and dashes.").arg(id));
     if (options.withSamples) {
         const QString seedError = vemi::SampleData::seedIfEmpty(store);
         if (!seedError.isEmpty())

@@ -1,4 +1,5 @@
 #include "PluginCatalog.h"
+#include "ShellOptions.h"
 
 #include "ClientInterface.h"
 
@@ -18,6 +19,8 @@ private slots:
     void badStoreFileStopsTheShell_data();
     void badStoreFileStopsTheShell();
     void shellStartsWithTheEditorTab();
+    void otherStoresLiveBesideTheDefault_data();
+    void otherStoresLiveBesideTheDefault();
 
 private:
     static QProcess* runShell(const QStringList& arguments, const QString& home);
@@ -95,6 +98,29 @@ void tst_Shell::shellStartsWithTheEditorTab()
     const QImage picture(shot);
     QVERIFY(!picture.isNull());
     QVERIFY(picture.width() >= 800);
+}
+
+void tst_Shell::otherStoresLiveBesideTheDefault_data()
+{
+    QTest::addColumn<QString>("id");
+    QTest::addColumn<QString>("file");
+    QTest::newRow("a plain name") << "Plant 2" << "/data/Plant 2.sqlite";
+    QTest::newRow("the default store is not added twice") << "Local" << "";
+    QTest::newRow("a path that climbs out is refused") << "../secrets" << "";
+    QTest::newRow("an absolute path is refused") << "/etc/passwd" << "";
+}
+
+void tst_Shell::otherStoresLiveBesideTheDefault()
+{
+    QFETCH(QString, id);
+    QFETCH(QString, file);
+    ShellOptions options;
+    options.storePath = QStringLiteral("/data/store.sqlite");
+    QStringList refused;
+    const auto files = options.otherStoreFiles({id.toStdString()}, &refused);
+    const auto found = files.find(id.toStdString());
+    QCOMPARE(found == files.end() ? QString() : found->second, file);
+    QCOMPARE(refused.contains(id), file.isEmpty() && id != QLatin1String("Local"));
 }
 
 QTEST_MAIN(tst_Shell)
