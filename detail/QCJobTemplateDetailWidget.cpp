@@ -44,8 +44,8 @@ void QCJobTemplateDetailWidget::reloadFromModel()
     m_heading->setText(QString::fromStdString(jobTemplate->name()));
     const QString description = QString::fromStdString(jobTemplate->description());
     m_summary->setText(tr("%1\n\nCheckpoints: %2")
-                           .arg(description.isEmpty() ? tr("No description.") : description)
-                           .arg(jobTemplate->checkPoints().size()));
+                           .arg(description.isEmpty() ? tr("No description.") : description,
+                                QString::number(jobTemplate->checkPoints().size())));
 }
 
 } // namespace vemi

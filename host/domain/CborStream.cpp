@@ -71,7 +71,9 @@ void writeValue(QCborStreamWriter& writer, const QCborValue& value, const Detach
                       + reader.lastError().toString().toStdString());
 }
 
-SharedBytes readByteString(QCborStreamReader& reader)
+// inputSize bounds what a chunk may declare: a damaged length must not
+// make us allocate more than the input could hold.
+SharedBytes readByteString(QCborStreamReader& reader, qint64 inputSize)
 {
     auto data = std::make_shared<std::vector<unsigned char>>();
     QCborStreamReader::StringResult<qsizetype> chunk;
@@ -79,6 +81,9 @@ SharedBytes readByteString(QCborStreamReader& reader)
         const qsizetype size = reader.currentStringChunkSize();
         if (size < 0)
             fail(reader);
+        if (size > inputSize - reader.currentOffset())
+            throw DecodeError("a byte string at byte " + std::to_string(reader.currentOffset())
+                              + " is longer than the data");
         const size_t offset = data->size();
         data->resize(offset + size_t(size));
         chunk = reader.readStringChunk(reinterpret_cast<char*>(data->data() + offset), size);
@@ -102,9 +107,18 @@ QString readTextString(QCborStreamReader& reader)
     return text;
 }
 
-QCborValue readValue(QCborStreamReader& reader, DetachedBytes& bytes, int depth);
+// Reads one value and everything in it; byte strings go to the detached table.
+struct TreeReader
+{
+    QCborStreamReader& reader;
+    DetachedBytes& bytes;
+    qint64 inputSize;
 
-QCborValue readContainer(QCborStreamReader& reader, DetachedBytes& bytes, int depth)
+    QCborValue value(int depth);
+    QCborValue container(int depth);
+};
+
+QCborValue TreeReader::container(int depth)
 {
     const bool isMap = reader.isMap();
     if (!reader.enterContainer())
@@ -112,9 +126,9 @@ QCborValue readContainer(QCborStreamReader& reader, DetachedBytes& bytes, int de
     QCborArray array;
     QCborMap map;
     while (reader.hasNext()) {
-        QCborValue first = readValue(reader, bytes, depth + 1);
+        QCborValue first = value(depth + 1);
         if (isMap)
-            map.insert(first, readValue(reader, bytes, depth + 1));
+            map.insert(first, value(depth + 1));
         else
             array.append(first);
     }
@@ -123,32 +137,32 @@ QCborValue readContainer(QCborStreamReader& reader, DetachedBytes& bytes, int de
     return isMap ? QCborValue(map) : QCborValue(array);
 }
 
-QCborValue readValue(QCborStreamReader& reader, DetachedBytes& bytes, int depth)
+QCborValue TreeReader::value(int depth)
 {
     if (depth > kMaxDepth)
         throw DecodeError("CBOR nested too deeply");
-    QCborValue value;
+    QCborValue result;
     switch (reader.type()) {
     case QCborStreamReader::UnsignedInteger:
-    case QCborStreamReader::NegativeInteger: value = QCborValue(reader.toInteger()); break;
-    case QCborStreamReader::ByteString: return bytes.add(readByteString(reader));
+    case QCborStreamReader::NegativeInteger: result = QCborValue(reader.toInteger()); break;
+    case QCborStreamReader::ByteString: return bytes.add(readByteString(reader, inputSize));
     case QCborStreamReader::TextString: return QCborValue(readTextString(reader));
     case QCborStreamReader::Array:
-    case QCborStreamReader::Map: return readContainer(reader, bytes, depth);
+    case QCborStreamReader::Map: return container(depth);
     case QCborStreamReader::Tag: {
         const QCborTag tag = reader.toTag();
         reader.next();
-        return QCborValue(tag, readValue(reader, bytes, depth + 1));
+        return QCborValue(tag, value(depth + 1));
     }
-    case QCborStreamReader::SimpleType: value = QCborValue(reader.toSimpleType()); break;
-    case QCborStreamReader::Float16: value = QCborValue(double(reader.toFloat16())); break;
-    case QCborStreamReader::Float: value = QCborValue(double(reader.toFloat())); break;
-    case QCborStreamReader::Double: value = QCborValue(reader.toDouble()); break;
+    case QCborStreamReader::SimpleType: result = QCborValue(reader.toSimpleType()); break;
+    case QCborStreamReader::Float16: result = QCborValue(double(reader.toFloat16())); break;
+    case QCborStreamReader::Float: result = QCborValue(double(reader.toFloat())); break;
+    case QCborStreamReader::Double: result = QCborValue(reader.toDouble()); break;
     default: fail(reader);
     }
     if (!reader.next())
         fail(reader);
-    return value;
+    return result;
 }
 
 } // namespace
@@ -165,7 +179,7 @@ QByteArray CborStream::write(const QCborValue& tree, const DetachedBytes& bytes)
 QCborValue CborStream::read(const QByteArray& data, DetachedBytes& bytes)
 {
     QCborStreamReader reader(data);
-    QCborValue tree = readValue(reader, bytes, 0);
+    QCborValue tree = TreeReader{reader, bytes, data.size()}.value(0);
     if (reader.lastError() != QCborError::NoError)
         fail(reader);
     return tree;

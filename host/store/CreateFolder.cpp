@@ -14,13 +14,12 @@ std::shared_ptr<Response> CreateFolder::execute(StoreDatabase& database)
                      m_objectType};
     database.writeTransaction([&] {
         DirectoryQueries queries(database);
-        queries.requireFolder(m_parentId, "create the folder");
+        queries.requireFolder(m_parentId, m_objectType);
         queries.requireFreeFolderName(m_objectType, m_parentId, m_name, std::string());
         database.run(QStringLiteral("INSERT INTO folders(id, object_type, parent_id, name) VALUES(?, ?, ?, ?)"),
                      {QString::fromStdString(folder.id), QString::fromStdString(m_objectType),
                       m_parentId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(m_parentId)),
-                      QString::fromStdString(m_name)},
-                     "create the folder");
+                      QString::fromStdString(m_name)});
     });
     return std::make_shared<FolderResponse>(folder);
 }

@@ -14,13 +14,16 @@ QVariant nullable(const std::string& id)
 
 } // namespace
 
-void DirectoryQueries::requireFolder(const std::string& folderId, const char* operation)
+void DirectoryQueries::requireFolder(const std::string& folderId, const std::string& objectType)
 {
     if (folderId.empty())
         return;
-    if (!m_database.scalar(QStringLiteral("SELECT 1 FROM folders WHERE id = ?"),
-                           {QString::fromStdString(folderId)}, operation).isValid())
+    const QVariant type = m_database.scalar(QStringLiteral("SELECT object_type FROM folders WHERE id = ?"),
+                                            {QString::fromStdString(folderId)});
+    if (!type.isValid())
         throw StoreError("the folder no longer exists");
+    if (type.toString().toStdString() != objectType)
+        throw StoreError("the folder holds objects of another type");
 }
 
 void DirectoryQueries::requireFreeFolderName(const std::string& objectType, const std::string& parentId,
@@ -31,8 +34,7 @@ void DirectoryQueries::requireFreeFolderName(const std::string& objectType, cons
     const QVariant clash = m_database.scalar(
         QStringLiteral("SELECT 1 FROM folders WHERE object_type = ? AND parent_id IS ? AND name = ? AND id <> ?"),
         {QString::fromStdString(objectType), nullable(parentId), QString::fromStdString(name),
-         QString::fromStdString(exceptId)},
-        "name the folder");
+         QString::fromStdString(exceptId)});
     if (clash.isValid())
         throw StoreError("a folder named \"" + name + "\" already exists there");
 }
@@ -40,10 +42,10 @@ void DirectoryQueries::requireFreeFolderName(const std::string& objectType, cons
 bool DirectoryQueries::isInSubtree(const std::string& folderId, const std::string& rootId)
 {
     return m_database.scalar(
-        QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT ? UNION ALL"
+        QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT ? UNION"
                        " SELECT f.id FROM folders f JOIN sub ON f.parent_id = sub.id)"
                        " SELECT 1 FROM sub WHERE id = ?"),
-        {QString::fromStdString(rootId), QString::fromStdString(folderId)}, "move the folder").isValid();
+        {QString::fromStdString(rootId), QString::fromStdString(folderId)}).isValid();
 }
 
 } // namespace vemi

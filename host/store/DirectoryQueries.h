@@ -12,8 +12,9 @@ class DirectoryQueries
 public:
     explicit DirectoryQueries(StoreDatabase& database) : m_database(database) {}
 
-    // Throws StoreError when parentId names no folder (an empty id is the top level).
-    void requireFolder(const std::string& folderId, const char* operation);
+    // Throws StoreError when folderId names no folder of the object type (an
+    // empty id is the top level, which every type has).
+    void requireFolder(const std::string& folderId, const std::string& objectType);
     // Throws StoreError when a sibling folder already has the name.
     void requireFreeFolderName(const std::string& objectType, const std::string& parentId,
                                const std::string& name, const std::string& exceptId);

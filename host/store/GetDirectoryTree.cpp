@@ -13,7 +13,7 @@ std::shared_ptr<Response> GetDirectoryTree::execute(StoreDatabase& database)
     std::vector<DirFolder> folders;
     QSqlQuery folderRows = database.run(
         QStringLiteral("SELECT id, parent_id, name FROM folders WHERE object_type = ? ORDER BY name"),
-        {type}, "list the folders");
+        {type});
     while (folderRows.next()) {
         folders.push_back({folderRows.value(0).toString().toStdString(), folderRows.value(1).toString().toStdString(),
                            folderRows.value(2).toString().toStdString(), m_objectType});
@@ -23,7 +23,7 @@ std::shared_ptr<Response> GetDirectoryTree::execute(StoreDatabase& database)
     QSqlQuery entryRows = database.run(
         QStringLiteral("SELECT e.id, e.object_id, e.folder_id, o.name FROM dir_entries e"
                        " JOIN objects o ON o.id = e.object_id WHERE o.type = ? ORDER BY o.name"),
-        {type}, "list the folders");
+        {type});
     while (entryRows.next()) {
         auto entry = std::make_shared<DirEntry>();
         entry->setId(entryRows.value(0).toString().toStdString());

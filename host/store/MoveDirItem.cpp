@@ -19,15 +19,24 @@ QVariant nullable(const std::string& id)
 std::shared_ptr<Response> MoveDirItem::execute(StoreDatabase& database)
 {
     database.writeTransaction([&] {
-        DirectoryQueries(database).requireFolder(m_targetFolderId, "move the item");
-        if (m_kind == DirItemKind::Folder) {
+        if (m_kind == DirItemKind::Folder)
             moveFolder(database);
-        } else {
-            database.run(QStringLiteral("UPDATE dir_entries SET folder_id = ? WHERE id = ?"),
-                         {nullable(m_targetFolderId), QString::fromStdString(m_id)}, "move the entry");
-        }
+        else
+            moveEntry(database);
     });
     return std::make_shared<Response>();
+}
+
+void MoveDirItem::moveEntry(StoreDatabase& database)
+{
+    const QVariant type = database.scalar(QStringLiteral("SELECT o.type FROM dir_entries e"
+                                                         " JOIN objects o ON o.id = e.object_id WHERE e.id = ?"),
+                                          {QString::fromStdString(m_id)});
+    if (!type.isValid())
+        throw StoreError("the entry no longer exists");
+    DirectoryQueries(database).requireFolder(m_targetFolderId, type.toString().toStdString());
+    database.run(QStringLiteral("UPDATE dir_entries SET folder_id = ? WHERE id = ?"),
+                 {nullable(m_targetFolderId), QString::fromStdString(m_id)});
 }
 
 void MoveDirItem::moveFolder(StoreDatabase& database)
@@ -36,13 +45,14 @@ void MoveDirItem::moveFolder(StoreDatabase& database)
     if (!m_targetFolderId.empty() && queries.isInSubtree(m_targetFolderId, m_id))
         throw StoreError("a folder cannot be moved into itself");
     QSqlQuery folder = database.run(QStringLiteral("SELECT object_type, name FROM folders WHERE id = ?"),
-                                    {QString::fromStdString(m_id)}, "move the folder");
+                                    {QString::fromStdString(m_id)});
     if (!folder.next())
         throw StoreError("the folder no longer exists");
+    queries.requireFolder(m_targetFolderId, folder.value(0).toString().toStdString());
     queries.requireFreeFolderName(folder.value(0).toString().toStdString(), m_targetFolderId,
                                   folder.value(1).toString().toStdString(), m_id);
     database.run(QStringLiteral("UPDATE folders SET parent_id = ? WHERE id = ?"),
-                 {nullable(m_targetFolderId), QString::fromStdString(m_id)}, "move the folder");
+                 {nullable(m_targetFolderId), QString::fromStdString(m_id)});
 }
 
 } // namespace vemi

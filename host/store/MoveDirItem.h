@@ -17,6 +17,7 @@ public:
 
 private:
     void moveFolder(StoreDatabase& database);
+    void moveEntry(StoreDatabase& database);
 
     DirItemKind m_kind;
     std::string m_id;

@@ -14,18 +14,20 @@ QtCommand::QtCommand(std::shared_ptr<Command> command)
 
 QtCommand::~QtCommand() = default;
 
-// Each post captures a handle to the wrapper: it stays alive until its
+// Each delivery holds a handle to the wrapper: it stays alive until its
 // signal has been emitted on its own thread.
-void QtCommand::postResponse(std::shared_ptr<Response> response)
+void QtCommand::deliverResponse(std::shared_ptr<QtCommand> command, std::shared_ptr<Response> response)
 {
-    QMetaObject::invokeMethod(this, [self = shared_from_this(), response]() {
+    QtCommand* receiver = command.get();
+    QMetaObject::invokeMethod(receiver, [self = std::move(command), response]() {
         emit self->responseReceived(response);
     }, Qt::QueuedConnection);
 }
 
-void QtCommand::postError(std::shared_ptr<ErrorInfo> error)
+void QtCommand::deliverError(std::shared_ptr<QtCommand> command, std::shared_ptr<ErrorInfo> error)
 {
-    QMetaObject::invokeMethod(this, [self = shared_from_this(), error]() {
+    QtCommand* receiver = command.get();
+    QMetaObject::invokeMethod(receiver, [self = std::move(command), error]() {
         emit self->errorReceived(error);
     }, Qt::QueuedConnection);
 }

@@ -25,9 +25,12 @@ public:
 
     std::shared_ptr<Command> command() const { return m_command; }
 
-    // Thread-safe: queue the answer for delivery on this wrapper's thread.
-    void postResponse(std::shared_ptr<Response> response);
-    void postError(std::shared_ptr<ErrorInfo> error);
+    // Thread-safe: queue the answer for delivery on the wrapper's thread. They
+    // take the caller's handle, so that the wrapper (a QObject) is released on
+    // its own thread, never on the worker's.
+    static void deliverResponse(std::shared_ptr<QtCommand> command, std::shared_ptr<Response> response);
+    static void deliverError(std::shared_ptr<QtCommand> command, std::shared_ptr<ErrorInfo> error);
+    // Thread-safe, for a command that is still running.
     void postProgress(std::shared_ptr<Progress> progress);
 
 signals:

@@ -26,27 +26,27 @@ std::shared_ptr<Response> RenameDirItem::execute(StoreDatabase& database)
 void RenameDirItem::renameFolder(StoreDatabase& database)
 {
     QSqlQuery folder = database.run(QStringLiteral("SELECT object_type, parent_id FROM folders WHERE id = ?"),
-                                    {QString::fromStdString(m_id)}, "rename the folder");
+                                    {QString::fromStdString(m_id)});
     if (!folder.next())
         throw StoreError("the folder no longer exists");
     DirectoryQueries(database).requireFreeFolderName(folder.value(0).toString().toStdString(),
                                                      folder.value(1).toString().toStdString(), m_name, m_id);
     database.run(QStringLiteral("UPDATE folders SET name = ? WHERE id = ?"),
-                 {QString::fromStdString(m_name), QString::fromStdString(m_id)}, "rename the folder");
+                 {QString::fromStdString(m_name), QString::fromStdString(m_id)});
 }
 
 void RenameDirItem::renameEntry(StoreDatabase& database)
 {
     QSqlQuery stored = database.run(QStringLiteral("SELECT o.id, o.data FROM dir_entries e"
                                                    " JOIN objects o ON o.id = e.object_id WHERE e.id = ?"),
-                                    {QString::fromStdString(m_id)}, "rename the object");
+                                    {QString::fromStdString(m_id)});
     if (!stored.next())
         throw StoreError("the entry no longer exists");
     const QString objectId = stored.value(0).toString();
     auto object = ObjectCodec::deserialize(stored.value(1).toByteArray());
     object->header()->setName(m_name);
     database.run(QStringLiteral("UPDATE objects SET name = ?, data = ? WHERE id = ?"),
-                 {QString::fromStdString(m_name), ObjectCodec::serialize(*object), objectId}, "rename the object");
+                 {QString::fromStdString(m_name), ObjectCodec::serialize(*object), objectId});
 }
 
 } // namespace vemi

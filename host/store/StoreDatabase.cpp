@@ -89,84 +89,91 @@ void StoreDatabase::open()
     if (m_options.readOnly)
         connectOptions += QStringLiteral(";QSQLITE_OPEN_READONLY");
     database.setConnectOptions(connectOptions);
-    if (!database.open())
-        throw StoreError(describe(database.lastError(), "open the store").toStdString());
-
-    checkOwnership(readPragma("application_id"), readPragma("user_version"),
-                   scalar(QStringLiteral("SELECT count(*) FROM sqlite_master"), {}, "open the store").toInt());
-    applyPragmas();
+    try {
+        if (!database.open())
+            throw StoreError(describe(database.lastError()).toStdString());
+        checkOwnership();
+        applyPragmas();
+    } catch (const StoreError& error) {
+        throw StoreError(std::string("Cannot open the store: ") + error.what());
+    }
     m_open = true;
 }
 
 int StoreDatabase::readPragma(const char* name)
 {
-    return scalar(QStringLiteral("PRAGMA %1").arg(QLatin1String(name)), {}, "open the store").toInt();
+    return scalar(QStringLiteral("PRAGMA %1").arg(QLatin1String(name)), {}).toInt();
 }
 
-void StoreDatabase::checkOwnership(int applicationId, int version, int tableCount)
+// Throws when the file is not a store of this program or one it cannot use;
+// nothing is written before these checks pass.
+void StoreDatabase::checkOwnership()
 {
-    const bool fresh = applicationId == 0 && version == 0 && tableCount == 0;
+    const std::string file = m_path.toStdString();
+    const int applicationId = readPragma("application_id");
+    const int version = readPragma("user_version");
+    const bool fresh = applicationId == 0 && version == 0
+                       && scalar(QStringLiteral("SELECT count(*) FROM sqlite_master")).toInt() == 0;
     if (!fresh && applicationId != kApplicationId)
-        throw StoreError("cannot open the store " + m_path.toStdString()
-                         + ": the file is another program's SQLite database, not a store");
+        throw StoreError("the file is another program's SQLite database, not a store: " + file);
     if (version > schemaVersion())
-        throw StoreError("cannot open the store " + m_path.toStdString() + ": it was written by a newer version"
-                         + " (schema " + std::to_string(version) + ", this program knows "
-                         + std::to_string(schemaVersion()) + ")");
+        throw StoreError("it was written by a newer version (schema " + std::to_string(version)
+                         + ", this program knows " + std::to_string(schemaVersion()) + "): " + file);
     if (version < schemaVersion()) {
         if (m_options.readOnly)
-            throw StoreError("cannot open the store " + m_path.toStdString()
-                             + " read-only: it must first be created or upgraded");
-        migrate(version);
+            throw StoreError("a read-only store must first be created or upgraded: " + file);
+        migrate();
     }
 }
 
-void StoreDatabase::migrate(int fromVersion)
+void StoreDatabase::migrate()
 {
     writeTransaction([&] {
+        // Another program may have created or upgraded the schema since it was read.
+        const int fromVersion = readPragma("user_version");
         for (int version = fromVersion; version < schemaVersion(); ++version) {
             for (const QString& statement : migrations()[size_t(version)])
-                run(statement, {}, "upgrade the store");
+                run(statement, {});
         }
-        run(QStringLiteral("PRAGMA application_id = %1").arg(kApplicationId), {}, "upgrade the store");
-        run(QStringLiteral("PRAGMA user_version = %1").arg(schemaVersion()), {}, "upgrade the store");
+        run(QStringLiteral("PRAGMA application_id = %1").arg(kApplicationId), {});
+        run(QStringLiteral("PRAGMA user_version = %1").arg(schemaVersion()), {});
     });
 }
 
 void StoreDatabase::applyPragmas()
 {
-    run(QStringLiteral("PRAGMA foreign_keys = ON"), {}, "open the store");
+    run(QStringLiteral("PRAGMA foreign_keys = ON"), {});
     if (m_options.readOnly)
         return;
-    run(QStringLiteral("PRAGMA journal_mode = WAL"), {}, "open the store");
-    run(QStringLiteral("PRAGMA synchronous = NORMAL"), {}, "open the store");
+    run(QStringLiteral("PRAGMA journal_mode = WAL"), {});
+    run(QStringLiteral("PRAGMA synchronous = NORMAL"), {});
 }
 
-QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings, const char* operation)
+QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings)
 {
     QSqlQuery query(QSqlDatabase::database(m_connectionName, false));
     query.setForwardOnly(true);
     if (!query.prepare(sql))
-        throw StoreError(describe(query.lastError(), operation).toStdString());
+        throw StoreError(describe(query.lastError()).toStdString());
     for (const QVariant& value : bindings)
         query.addBindValue(value);
     if (!query.exec())
-        throw StoreError(describe(query.lastError(), operation).toStdString());
+        throw StoreError(describe(query.lastError()).toStdString());
     return query;
 }
 
-QVariant StoreDatabase::scalar(const QString& sql, const QVariantList& bindings, const char* operation)
+QVariant StoreDatabase::scalar(const QString& sql, const QVariantList& bindings)
 {
-    QSqlQuery query = run(sql, bindings, operation);
+    QSqlQuery query = run(sql, bindings);
     return query.next() ? query.value(0) : QVariant();
 }
 
 void StoreDatabase::writeTransaction(const std::function<void()>& body)
 {
-    run(QStringLiteral("BEGIN IMMEDIATE"), {}, "start writing to the store");
+    run(QStringLiteral("BEGIN IMMEDIATE"), {});
     try {
         body();
-        run(QStringLiteral("COMMIT"), {}, "finish writing to the store");
+        run(QStringLiteral("COMMIT"), {});
     } catch (...) {
         QSqlQuery rollback(QSqlDatabase::database(m_connectionName, false));
         rollback.exec(QStringLiteral("ROLLBACK"));
@@ -174,15 +181,12 @@ void StoreDatabase::writeTransaction(const std::function<void()>& body)
     }
 }
 
-QString StoreDatabase::describe(const QSqlError& error, const char* operation) const
+QString StoreDatabase::describe(const QSqlError& error) const
 {
     const QString cause = primaryCause(error.nativeErrorCode().toInt());
     const QString detail = error.databaseText().isEmpty() ? error.text() : error.databaseText();
-    QString message = cause.isEmpty() ? detail : cause + QStringLiteral(" (") + detail + QLatin1Char(')');
-    message += QStringLiteral(": ") + m_path;
-    if (operation)
-        message = QStringLiteral("Cannot %1: ").arg(QLatin1String(operation)) + message;
-    return message;
+    const QString message = cause.isEmpty() ? detail : cause + QStringLiteral(" (") + detail + QLatin1Char(')');
+    return message + QStringLiteral(": ") + m_path;
 }
 
 } // namespace vemi

@@ -35,18 +35,19 @@ public:
     void open();
 
     // Runs one statement with positional bindings, positioned before its first
-    // row; throws StoreError.
-    QSqlQuery run(const QString& sql, const QVariantList& bindings = {}, const char* operation = nullptr);
+    // row; throws StoreError with the cause and the file (the dispatcher adds
+    // what the command was doing).
+    QSqlQuery run(const QString& sql, const QVariantList& bindings = {});
     // The first column of the first row, or an invalid QVariant when there is none.
-    QVariant scalar(const QString& sql, const QVariantList& bindings = {}, const char* operation = nullptr);
+    QVariant scalar(const QString& sql, const QVariantList& bindings = {});
     // Runs body inside BEGIN IMMEDIATE … COMMIT; rolls back and rethrows on failure.
     void writeTransaction(const std::function<void()>& body);
 
-    QString describe(const QSqlError& error, const char* operation) const;
+    QString describe(const QSqlError& error) const;
 
 private:
-    void checkOwnership(int applicationId, int version, int tableCount);
-    void migrate(int fromVersion);
+    void checkOwnership();
+    void migrate();
     void applyPragmas();
     int readPragma(const char* name);
 

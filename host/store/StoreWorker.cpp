@@ -38,24 +38,35 @@ void StoreWorker::close()
 
 void StoreWorker::run(std::shared_ptr<QtCommand> command)
 {
+    std::shared_ptr<ErrorInfo> error;
+    std::shared_ptr<Response> response;
     const QString openError = ensureOpen();
-    if (!openError.isEmpty()) {
-        command->postError(std::make_shared<ErrorInfo>(openError));
-        return;
-    }
-    const std::string what = command->command()->description();
+    if (openError.isEmpty())
+        response = execute(*command->command(), error);
+    else
+        error = std::make_shared<ErrorInfo>(openError);
+    // The handle moves into the delivery: the worker keeps none of its own.
+    if (error)
+        QtCommand::deliverError(std::move(command), std::move(error));
+    else
+        QtCommand::deliverResponse(std::move(command), std::move(response));
+}
+
+std::shared_ptr<Response> StoreWorker::execute(Command& command, std::shared_ptr<ErrorInfo>& error)
+{
+    const QString what = QString::fromStdString(command.description());
+    const auto fail = [&](const QString& cause) {
+        error = std::make_shared<ErrorInfo>(QStringLiteral("Cannot %1: %2").arg(what, cause));
+        return nullptr;
+    };
     try {
-        command->postResponse(command->command()->execute(*m_database));
-    } catch (const StoreError& error) {
-        command->postError(std::make_shared<ErrorInfo>(
-            QStringLiteral("Cannot %1: %2").arg(QString::fromStdString(what), QString::fromUtf8(error.what()))));
-    } catch (const DecodeError& error) {
-        command->postError(std::make_shared<ErrorInfo>(
-            QStringLiteral("Cannot %1: the stored object is damaged (%2): %3")
-                .arg(QString::fromStdString(what), QString::fromUtf8(error.what()), m_path)));
-    } catch (const std::exception& error) {
-        command->postError(std::make_shared<ErrorInfo>(
-            QStringLiteral("Cannot %1: %2").arg(QString::fromStdString(what), QString::fromUtf8(error.what()))));
+        return command.execute(*m_database);
+    } catch (const StoreError& failure) {
+        return fail(QString::fromUtf8(failure.what()));
+    } catch (const DecodeError& failure) {
+        return fail(QStringLiteral("the stored object is damaged (%1): %2").arg(QString::fromUtf8(failure.what()), m_path));
+    } catch (const std::exception& failure) {
+        return fail(QString::fromUtf8(failure.what()));
     }
 }
 

@@ -9,7 +9,10 @@
 
 namespace vemi {
 
+class Command;
+class ErrorInfo;
 class QtCommand;
+class Response;
 class StoreDatabase;
 
 // Lives on a dispatcher's worker thread and owns that thread's connection,
@@ -29,6 +32,9 @@ public:
     void close();
 
 private:
+    // Runs the command; on failure sets error and returns null.
+    std::shared_ptr<Response> execute(Command& command, std::shared_ptr<ErrorInfo>& error);
+
     QString m_path;
     StoreOptions m_options;
     std::unique_ptr<StoreDatabase> m_database;

@@ -11,7 +11,7 @@ namespace vemi {
 std::shared_ptr<BaseObject> StoredObjectReader::read(const std::string& id, const std::string& expectedType, int depth)
 {
     QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data FROM objects WHERE id = ?"),
-                                     {QString::fromStdString(id)}, "read an object");
+                                     {QString::fromStdString(id)});
     if (!query.next())
         throw StoreError("there is no stored object with the id " + id);
     const std::string type = query.value(0).toString().toStdString();
@@ -23,7 +23,7 @@ std::shared_ptr<BaseObject> StoredObjectReader::read(const std::string& id, cons
 std::vector<std::shared_ptr<BaseObject>> StoredObjectReader::readAll(const std::string& type, int depth)
 {
     QSqlQuery query = m_database.run(QStringLiteral("SELECT id, data FROM objects WHERE type = ? ORDER BY name, id"),
-                                     {QString::fromStdString(type)}, "read objects");
+                                     {QString::fromStdString(type)});
     std::vector<std::shared_ptr<BaseObject>> objects;
     while (query.next())
         objects.push_back(decode(query.value(0).toString().toStdString(), query.value(1).toByteArray(), depth));

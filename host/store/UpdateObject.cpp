@@ -2,6 +2,7 @@
 
 #include "BaseObject.h"
 #include "DirEntry.h"
+#include "DirectoryQueries.h"
 #include "Header.h"
 #include "ObjectCodec.h"
 #include "StoreDatabase.h"
@@ -42,8 +43,7 @@ std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
                                     " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
                                     " name = excluded.name, data = excluded.data"),
                      {QString::fromStdString(m_id), QString::fromStdString(m_type),
-                      QString::fromStdString(m_name), data},
-                     "save the object");
+                      QString::fromStdString(m_name), data});
         if (m_folderId)
             entry = fileInFolder(database);
     });
@@ -53,19 +53,16 @@ std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
 std::shared_ptr<DirEntry> UpdateObject::fileInFolder(StoreDatabase& database)
 {
     QVariant entryId = database.scalar(QStringLiteral("SELECT id FROM dir_entries WHERE object_id = ?"),
-                                       {QString::fromStdString(m_id)}, "file the object");
+                                       {QString::fromStdString(m_id)});
     std::string folderId = *m_folderId;
     if (entryId.isValid()) {
         folderId = database.scalar(QStringLiteral("SELECT folder_id FROM dir_entries WHERE id = ?"),
-                                   {entryId}, "file the object").toString().toStdString();
+                                   {entryId}).toString().toStdString();
     } else {
-        if (!folderId.empty()
-            && !database.scalar(QStringLiteral("SELECT 1 FROM folders WHERE id = ?"),
-                                {QString::fromStdString(folderId)}, "file the object").isValid())
-            throw StoreError("the folder it belongs in was deleted");
+        DirectoryQueries(database).requireFolder(folderId, m_type);
         entryId = QUuid::createUuid().toString(QUuid::WithoutBraces);
         database.run(QStringLiteral("INSERT INTO dir_entries(id, object_id, folder_id) VALUES(?, ?, ?)"),
-                     {entryId, QString::fromStdString(m_id), folderValue(folderId)}, "file the object");
+                     {entryId, QString::fromStdString(m_id), folderValue(folderId)});
     }
     auto entry = std::make_shared<DirEntry>();
     entry->setId(entryId.toString().toStdString());

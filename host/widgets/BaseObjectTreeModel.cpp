@@ -161,14 +161,20 @@ BaseObjectTreeModel::Node* BaseObjectTreeModel::findBySerial(quint64 serial) con
     return nullptr;
 }
 
-void BaseObjectTreeModel::resetTree(std::unique_ptr<Node> newRoot)
+void BaseObjectTreeModel::rebuildTree(const Rebuild& build)
 {
     beginResetModel();
-    m_root->m_children.clear();
-    for (auto& child : newRoot->m_children) {
-        child->m_parent = m_root.get();
-        m_root->m_children.push_back(std::move(child));
+    std::vector<std::unique_ptr<Node>> previous;
+    previous.swap(m_root->m_children);
+    // previous grows while it is walked: each node hands over its children in turn.
+    for (size_t i = 0; i < previous.size(); ++i) {
+        Node* node = previous[i].get();
+        node->m_parent = nullptr;
+        for (auto& child : node->m_children)
+            previous.push_back(std::move(child));
+        node->m_children.clear();
     }
+    build(previous, m_root.get());
     endResetModel();
 }
 

@@ -2,6 +2,7 @@
 
 #include <QAbstractItemModel>
 
+#include <functional>
 #include <memory>
 #include <vector>
 
@@ -79,13 +80,17 @@ public:
     int columnCount(const QModelIndex& parent = {}) const override;
     QVariant data(const QModelIndex& index, int role = Qt::DisplayRole) const override;
 
-protected:
-    virtual QIcon iconFor(const Node* node) const;
-    // Replaces every node below the root by the children of newRoot.
-    void resetTree(std::unique_ptr<Node> newRoot);
     // For building a tree outside the model: append, then sort once.
     static void adopt(Node* parent, std::unique_ptr<Node> child);
     static void sortRecursively(Node* parent);
+
+protected:
+    virtual QIcon iconFor(const Node* node) const;
+    using Rebuild = std::function<void(std::vector<std::unique_ptr<Node>>& previous, Node* root)>;
+    // Takes every node out of the tree, each without parent and children, and
+    // lets build put the tree together again from them and new nodes; nodes it
+    // leaves in previous are destroyed. Views see one reset.
+    void rebuildTree(const Rebuild& build);
 
 private:
     static bool sortsBefore(const Node* a, const Node* b);

@@ -182,7 +182,13 @@ void DirEntryBrowserWidget::emitSelection(quint64 generation)
         return;
     rememberSelection();
     updateActions();
-    emit sgSelectionChanged(selectedNodes());
+    // An entry whose object could not be loaded (the error was shown) is left out.
+    QVector<Node*> nodes;
+    for (Node* node : selectedNodes()) {
+        if (node->isFolder() || node->object())
+            nodes.append(node);
+    }
+    emit sgSelectionChanged(nodes);
 }
 
 std::string DirEntryBrowserWidget::keyOf(const Node* node) const
@@ -288,28 +294,58 @@ void DirEntryBrowserWidget::createNewObject()
     selectNode(m_model->addUnsavedObject(folder, object));
 }
 
+// Dialogs below run their own event loop, in which answers from the store may
+// rebuild or shrink the tree: they hold serials across the dialog, not nodes.
+
+std::vector<quint64> DirEntryBrowserWidget::serialsOf(const std::vector<Node*>& nodes)
+{
+    std::vector<quint64> serials;
+    for (const Node* node : nodes)
+        serials.push_back(node ? node->serial() : 0);
+    return serials;
+}
+
+std::vector<Node*> DirEntryBrowserWidget::liveNodes(const std::vector<quint64>& serials) const
+{
+    std::vector<Node*> nodes;
+    for (quint64 serial : serials) {
+        if (Node* node = m_model->findBySerial(serial))
+            nodes.push_back(node);
+    }
+    return nodes;
+}
+
+QString DirEntryBrowserWidget::pathText(const Node* node) const
+{
+    QStringList path;
+    for (const std::string& folder : m_model->pathOf(node))
+        path << QString::fromStdString(folder);
+    if (!node->isFolder())
+        path << node->displayName();
+    return path.join(QLatin1Char('/'));
+}
+
 void DirEntryBrowserWidget::openObject()
 {
     QStringList names;
     std::vector<Node*> candidates;
     for (Node* node : m_model->descendants(m_model->root())) {
-        if (node->isFolder())
-            continue;
-        QStringList path;
-        for (const std::string& folder : m_model->pathOf(node))
-            path << QString::fromStdString(folder);
-        path << node->displayName();
-        names << path.join(QLatin1Char('/'));
-        candidates.push_back(node);
+        if (!node->isFolder()) {
+            names << pathText(node);
+            candidates.push_back(node);
+        }
     }
     if (candidates.empty()) {
         showError(tr("There is nothing to open yet."));
         return;
     }
+    const std::vector<quint64> serials = serialsOf(candidates);
     bool ok = false;
     const QString chosen = QInputDialog::getItem(this, m_actionOpen->text(), m_plural, names, 0, false, &ok);
-    if (ok && names.contains(chosen))
-        selectNode(candidates[size_t(names.indexOf(chosen))]);
+    if (!ok || !names.contains(chosen))
+        return;
+    if (Node* node = m_model->findBySerial(serials[size_t(names.indexOf(chosen))]))
+        selectNode(node);
 }
 
 void DirEntryBrowserWidget::saveCurrentObject()
@@ -328,37 +364,50 @@ void DirEntryBrowserWidget::saveCurrentObject()
 
 bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)
 {
-    // A local event loop keeps the window responsive while the store writes.
-    QEventLoop loop;
-    int pending = int(nodes.size());
-    bool allSaved = true;
+    struct Progress
+    {
+        int pending = 0;
+        bool allSaved = true;
+        QEventLoop loop;
+    };
+    // Shared with the callbacks, which may come after this function returned
+    // (when the application quits the local event loop early).
+    auto progress = std::make_shared<Progress>();
+    progress->pending = int(nodes.size());
     for (Node* node : nodes) {
-        m_model->saveObject(static_cast<DirEntryNode*>(node), [&](bool ok) {
-            allSaved = allSaved && ok;
-            if (--pending == 0)
-                loop.quit();
+        m_model->saveObject(static_cast<DirEntryNode*>(node), [progress](bool ok) {
+            progress->allSaved = progress->allSaved && ok;
+            if (--progress->pending == 0)
+                progress->loop.quit();
         });
     }
-    if (pending > 0)
-        loop.exec();
+    // A local event loop keeps the window responsive while the store writes.
+    if (progress->pending > 0)
+        progress->loop.exec();
     updateActions();
-    return allSaved;
+    return progress->pending == 0 && progress->allSaved;
+}
+
+std::vector<Node*> DirEntryBrowserWidget::unsavedNodes() const
+{
+    std::vector<Node*> unsaved;
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (!node->isFolder() && node->isModified() && node->object())
+            unsaved.push_back(node);
+    }
+    return unsaved;
 }
 
 bool DirEntryBrowserWidget::mayClose()
 {
     if (!m_model)
         return true;
-    std::vector<Node*> unsaved;
-    QStringList names;
-    for (Node* node : m_model->descendants(m_model->root())) {
-        if (!node->isFolder() && node->isModified() && node->object()) {
-            unsaved.push_back(node);
-            names << QStringLiteral("  • ") + node->displayName();
-        }
-    }
+    const std::vector<Node*> unsaved = unsavedNodes();
     if (unsaved.empty())
         return true;
+    QStringList names;
+    for (const Node* node : unsaved)
+        names << QStringLiteral("  • ") + node->displayName();
     const QString label = unsaved.size() == 1 ? (m_singular.isEmpty() ? tr("object") : m_singular)
                                               : (m_plural.isEmpty() ? tr("objects") : m_plural);
     const auto answer = QMessageBox::question(
@@ -370,7 +419,7 @@ bool DirEntryBrowserWidget::mayClose()
         return true;
     if (answer != QMessageBox::Save)
         return false;
-    return saveAndWait(unsaved);
+    return saveAndWait(unsavedNodes());
 }
 
 void DirEntryBrowserWidget::refresh()
@@ -391,11 +440,18 @@ void DirEntryBrowserWidget::createFolder()
     QString suggestion = tr("New Folder");
     for (int number = 2; std::find(taken.begin(), taken.end(), suggestion.toStdString()) != taken.end(); ++number)
         suggestion = tr("New Folder %1").arg(number);
+    const quint64 parentSerial = parent ? parent->serial() : 0;
     bool ok = false;
     const QString name = QInputDialog::getText(this, tr("New Folder"), tr("Folder name:"), QLineEdit::Normal,
                                                suggestion, &ok).trimmed();
-    if (ok && !name.isEmpty())
-        m_model->createFolder(parent, name.toStdString(), {});
+    if (!ok || name.isEmpty())
+        return;
+    Node* liveParent = parentSerial ? m_model->findBySerial(parentSerial) : nullptr;
+    if (parentSerial && !liveParent) {
+        showError(tr("The folder was deleted meanwhile."));
+        return;
+    }
+    m_model->createFolder(liveParent, name.toStdString(), {});
 }
 
 void DirEntryBrowserWidget::renameCurrent()
@@ -403,33 +459,40 @@ void DirEntryBrowserWidget::renameCurrent()
     Node* node = currentNode();
     if (!node)
         return;
+    const quint64 serial = node->serial();
+    const QString oldName = node->displayName();
     bool ok = false;
-    const QString name = QInputDialog::getText(this, tr("Rename"), tr("New name:"), QLineEdit::Normal,
-                                               node->displayName(), &ok).trimmed();
-    if (ok && !name.isEmpty() && name != node->displayName())
+    const QString name = QInputDialog::getText(this, tr("Rename"), tr("New name:"), QLineEdit::Normal, oldName, &ok)
+                             .trimmed();
+    node = m_model->findBySerial(serial);
+    if (ok && node && !name.isEmpty() && name != oldName)
         m_model->renameNode(node, name.toStdString(), {});
 }
 
 void DirEntryBrowserWidget::moveSelection()
 {
-    const QVector<Node*> nodes = selectedNodes();
+    const QVector<Node*> selected = selectedNodes();
+    const std::vector<quint64> moving = serialsOf(std::vector<Node*>(selected.begin(), selected.end()));
     QStringList paths{tr("(top level)")};
     std::vector<Node*> folders{nullptr};
     for (Node* node : m_model->descendants(m_model->root())) {
-        if (!node->isFolder())
-            continue;
-        QStringList path;
-        for (const std::string& name : m_model->pathOf(node))
-            path << QString::fromStdString(name);
-        paths << path.join(QLatin1Char('/'));
-        folders.push_back(node);
+        if (node->isFolder()) {
+            paths << pathText(node);
+            folders.push_back(node);
+        }
     }
+    const std::vector<quint64> folderSerials = serialsOf(folders);
     bool ok = false;
     const QString chosen = QInputDialog::getItem(this, tr("Move To"), tr("Folder:"), paths, 0, false, &ok);
     if (!ok || !paths.contains(chosen))
         return;
-    Node* target = folders[size_t(paths.indexOf(chosen))];
-    for (Node* node : nodes)
+    const quint64 targetSerial = folderSerials[size_t(paths.indexOf(chosen))];
+    Node* target = targetSerial ? m_model->findBySerial(targetSerial) : nullptr;
+    if (targetSerial && !target) {
+        showError(tr("The folder was deleted meanwhile."));
+        return;
+    }
+    for (Node* node : liveNodes(moving))
         m_model->moveNode(node, target, {});
 }
 
@@ -438,13 +501,16 @@ void DirEntryBrowserWidget::deleteSelection()
     const QVector<Node*> nodes = selectedNodes();
     if (nodes.isEmpty())
         return;
+    const std::vector<quint64> serials = serialsOf(std::vector<Node*>(nodes.begin(), nodes.end()));
     const QString what = nodes.size() == 1 ? QStringLiteral("\"%1\"").arg(nodes.first()->displayName())
                                            : tr("%1 items").arg(nodes.size());
     if (QMessageBox::question(this, tr("Delete"),
                               tr("Delete %1 with everything in it? This cannot be undone.").arg(what))
         != QMessageBox::Yes)
         return;
-    m_model->deleteNodes(std::vector<Node*>(nodes.begin(), nodes.end()), {});
+    const std::vector<Node*> deleting = liveNodes(serials);
+    if (!deleting.empty())
+        m_model->deleteNodes(deleting, {});
 }
 
 } // namespace vemi

@@ -88,6 +88,10 @@ private:
     void openObject();
     void saveCurrentObject();
     bool saveAndWait(const std::vector<BaseObjectTreeModel::Node*>& nodes);
+    std::vector<BaseObjectTreeModel::Node*> unsavedNodes() const;
+    static std::vector<quint64> serialsOf(const std::vector<BaseObjectTreeModel::Node*>& nodes);
+    std::vector<BaseObjectTreeModel::Node*> liveNodes(const std::vector<quint64>& serials) const;
+    QString pathText(const BaseObjectTreeModel::Node* node) const;
     void createFolder();
     void renameCurrent();
     void moveSelection();

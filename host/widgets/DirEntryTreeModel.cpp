@@ -4,6 +4,7 @@
 #include "CreateFolder.h"
 #include "DeleteDirItems.h"
 #include "DirEntry.h"
+#include "DirEntryTreeBuilder.h"
 #include "DirectoryTreeResponse.h"
 #include "ErrorInfo.h"
 #include "FolderResponse.h"
@@ -75,57 +76,15 @@ std::string DirEntryTreeModel::folderIdOf(const Node* folder)
 void DirEntryTreeModel::load(const Done& done)
 {
     run(std::make_shared<GetDirectoryTree>(m_objectType),
-        [this](const std::shared_ptr<Response>& response) { rebuild(response); }, done);
-}
-
-void DirEntryTreeModel::rebuild(const std::shared_ptr<Response>& response)
-{
-    const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response);
-    if (!tree)
-        return;
-    auto newRoot = std::make_unique<Node>();
-    std::map<std::string, std::unique_ptr<FolderNode>> pending;
-    std::map<std::string, Node*> folders{{std::string(), newRoot.get()}};
-    for (const DirFolder& folder : tree->folders()) {
-        auto node = std::make_unique<FolderNode>(folder);
-        folders[folder.id] = node.get();
-        pending[folder.id] = std::move(node);
-    }
-    const auto folderOrTop = [&folders, &newRoot](const std::string& id) {
-        const auto found = folders.find(id);
-        return found == folders.end() ? newRoot.get() : found->second;
-    };
-    for (auto& [id, node] : pending) {
-        Node* parent = folderOrTop(node->folder().parentId);
-        adopt(parent == node.get() ? newRoot.get() : parent, std::move(node));
-    }
-
-    // Objects already loaded here keep their (possibly unsaved) state.
-    std::map<std::string, DirEntryNode*> loaded;
-    for (Node* node : descendants(root())) {
-        auto* entryNode = dynamic_cast<DirEntryNode*>(node);
-        if (!entryNode || !entryNode->object())
-            continue;
-        if (entryNode->isSaved()) {
-            loaded[entryNode->dirEntry()->id()] = entryNode;
-        } else {
-            auto copy = std::make_unique<DirEntryNode>(nullptr, entryNode->folderId());
-            copy->setObject(entryNode->object());
-            copy->setModified(true);
-            adopt(folderOrTop(entryNode->folderId()), std::move(copy));
-        }
-    }
-    for (const auto& entry : tree->entries()) {
-        auto node = std::make_unique<DirEntryNode>(entry, entry->folderId());
-        const auto previous = loaded.find(entry->id());
-        if (previous != loaded.end()) {
-            node->setObject(previous->second->object());
-            node->setModified(previous->second->isModified());
-        }
-        adopt(folderOrTop(entry->folderId()), std::move(node));
-    }
-    sortRecursively(newRoot.get());
-    resetTree(std::move(newRoot));
+        [this](const std::shared_ptr<Response>& response) {
+            const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response);
+            if (!tree)
+                return;
+            rebuildTree([&tree](std::vector<std::unique_ptr<Node>>& previous, Node* root) {
+                DirEntryTreeBuilder(previous).build(*tree, root);
+            });
+        },
+        done);
 }
 
 DirEntryTreeModel::FolderNode* DirEntryTreeModel::folderFor(Node* node) const
@@ -183,8 +142,9 @@ void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)
 {
     auto command = std::make_shared<UpdateObject>();
     command->setObject(node->object());
-    if (!node->isSaved())
-        command->setFolderId(node->folderId());
+    // Also for a stored object: should its entry have been deleted meanwhile,
+    // the store files it again instead of keeping an object nobody can find.
+    command->setFolderId(node->folderId());
     const quint64 serial = node->serial();
     const quint64 revision = node->revision();
     run(command, [this, serial, revision](const std::shared_ptr<Response>& response) {
@@ -222,8 +182,12 @@ void DirEntryTreeModel::createFolder(Node* parentFolder, const std::string& name
 void DirEntryTreeModel::renameNode(Node* node, const std::string& name, const Done& done)
 {
     auto* entryNode = dynamic_cast<DirEntryNode*>(node);
-    if (entryNode && !entryNode->isSaved()) {
+    // The open object takes the name at once, so that a save sent after the
+    // rename carries it too.
+    const std::string oldName = node->displayName().toStdString();
+    if (entryNode && entryNode->object())
         entryNode->object()->setName(name);
+    if (entryNode && !entryNode->isSaved()) {
         entryNode->setModified(true);
         nodeChanged(entryNode);
         if (done)
@@ -234,20 +198,36 @@ void DirEntryTreeModel::renameNode(Node* node, const std::string& name, const Do
     const std::string id = isFolder ? folderIdOf(node) : entryNode->dirEntry()->id();
     const quint64 serial = node->serial();
     run(std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name),
-        [this, serial, name](const std::shared_ptr<Response>&) {
-            Node* target = findBySerial(serial);
-            if (auto* folder = dynamic_cast<FolderNode*>(target))
-                folder->setName(name);
-            if (auto* entry = dynamic_cast<DirEntryNode*>(target)) {
-                entry->dirEntry()->header()->setName(name);
-                if (entry->object())
-                    entry->object()->setName(name);
-                auto changed = entry->dirEntry();
-                emit sgItemChanged(changed);
-            }
-            if (target)
-                nodeChanged(target);
-        }, done);
+        [this, serial, name](const std::shared_ptr<Response>&) { applyRename(serial, name); },
+        [this, serial, name, oldName, done](bool ok) {
+            if (!ok)
+                undoRename(serial, name, oldName);
+            if (done)
+                done(ok);
+        });
+}
+
+void DirEntryTreeModel::applyRename(quint64 serial, const std::string& name)
+{
+    Node* target = findBySerial(serial);
+    if (auto* folder = dynamic_cast<FolderNode*>(target))
+        folder->setName(name);
+    if (auto* entry = dynamic_cast<DirEntryNode*>(target); entry && entry->isSaved()) {
+        entry->dirEntry()->header()->setName(name);
+        auto changed = entry->dirEntry();
+        emit sgItemChanged(changed);
+    }
+    if (target)
+        nodeChanged(target);
+}
+
+void DirEntryTreeModel::undoRename(quint64 serial, const std::string& name, const std::string& oldName)
+{
+    auto* entry = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+    if (entry && entry->object() && entry->object()->name() == name) {
+        entry->object()->setName(oldName);
+        nodeChanged(entry);
+    }
 }
 
 void DirEntryTreeModel::moveNode(Node* node, Node* targetFolder, const Done& done)

@@ -27,6 +27,7 @@ public:
     public:
         explicit FolderNode(DirFolder folder) : m_folder(std::move(folder)) {}
         const DirFolder& folder() const { return m_folder; }
+        void setFolder(DirFolder folder) { m_folder = std::move(folder); }
         void setName(const std::string& name) { m_folder.name = name; }
         QString displayName() const override { return QString::fromStdString(m_folder.name); }
         bool isFolder() const override { return true; }
@@ -63,8 +64,9 @@ public:
     std::string dispatcherId() const { return m_dispatcherId; }
     void setDispatcherId(const std::string& dispatcherId) { m_dispatcherId = dispatcherId; }
 
-    // Reads the tree from the store. Objects already loaded, changed or not
-    // yet saved stay as they are.
+    // Reads the tree from the store. The nodes already there stay (with their
+    // objects, changed or not), so answers still on their way find them; an
+    // object changed here whose entry is gone stays as an unsaved object.
     void load(const Done& done = {});
     // The folder a new object goes into when node is current (null: top level).
     FolderNode* folderFor(Node* node) const;
@@ -90,8 +92,9 @@ protected:
 private:
     using OnResponse = std::function<void(const std::shared_ptr<Response>&)>;
     void run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done);
-    void rebuild(const std::shared_ptr<Response>& response);
     static std::string folderIdOf(const Node* folder);
+    void applyRename(quint64 serial, const std::string& name);
+    void undoRename(quint64 serial, const std::string& name, const std::string& oldName);
 
     MarloModel& m_store;
     std::string m_objectType;

@@ -555,6 +555,7 @@ void tst_Domain::malformedBytesThrow_data()
         << withField(*jobTemplate, "tagValues", QCborArray{fieldMap(TagValue(), "value", 1.5)});
     // Must fail cleanly rather than exhaust the stack.
     QTest::newRow("arrays nested a thousand deep") << QByteArray(1000, '\x81') + QByteArray(1, '\x00');
+    QTest::newRow("byte string declaring a gigabyte") << QByteArray::fromHex("5b0000000040000000616263");
     QTest::newRow("image data holding a foreign tagged value")
         << withField(*makeImage("i"), "imageData", QCborValue(QCborTag(0x51434A42), 0));
 }

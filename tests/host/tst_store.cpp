@@ -1,3 +1,4 @@
+#include "RawConnection.h"
 #include "TempStore.h"
 
 #include "ColorStandardsLibrary.h"
@@ -26,9 +27,6 @@
 #include "UpdateObjectResponse.h"
 
 #include <QFile>
-#include <QSqlDatabase>
-#include <QSqlError>
-#include <QSqlQuery>
 #include <QThread>
 #include <QtTest>
 
@@ -49,41 +47,6 @@ std::shared_ptr<QCJobTemplate> makeTemplate(const std::string& name, int imageBy
     jobTemplate->setSchematicImage(image);
     return jobTemplate;
 }
-
-// A second connection to the store file, as another program would open it.
-class RawConnection
-{
-public:
-    explicit RawConnection(const QString& path) : m_name(QStringLiteral("raw-%1").arg(++s_count))
-    {
-        QSqlDatabase database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_name);
-        database.setDatabaseName(path);
-        database.open();
-    }
-    ~RawConnection()
-    {
-        QSqlDatabase::database(m_name).close();
-        QSqlDatabase::removeDatabase(m_name);
-    }
-    bool exec(const QString& sql, const QVariantList& bindings = {})
-    {
-        QSqlQuery query(QSqlDatabase::database(m_name));
-        query.prepare(sql);
-        for (const QVariant& value : bindings)
-            query.addBindValue(value);
-        return query.exec();
-    }
-    QVariant scalar(const QString& sql)
-    {
-        QSqlQuery query(QSqlDatabase::database(m_name));
-        query.exec(sql);
-        return query.next() ? query.value(0) : QVariant();
-    }
-
-private:
-    static inline int s_count = 0;
-    QString m_name;
-};
 
 // Notes on which thread the store ran it.
 class ThreadProbe : public Command
@@ -116,6 +79,7 @@ private slots:
     void answersArriveOnCallersThread();
     void updateTakesSnapshotAtDispatch();
     void wrapperLivesUntilItDelivers();
+    void wrapperIsReleasedOnItsOwnThread();
     void storeMarksAndConfiguresItsFile();
     void refusesFilesThatAreNotStores_data();
     void refusesFilesThatAreNotStores();
@@ -128,6 +92,7 @@ private slots:
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
     void deletingFolderDeletesItsObjects();
+    void folderCycleDoesNotHangTheStore();
 };
 
 void tst_Store::templateSurvivesRestartByteForByte()
@@ -228,6 +193,30 @@ void tst_Store::wrapperLivesUntilItDelivers()
     }
     QTRY_VERIFY_WITH_TIMEOUT(delivered, 20000);
     QTRY_VERIFY(watch.expired());
+}
+
+void tst_Store::wrapperIsReleasedOnItsOwnThread()
+{
+    // The last handle must never be dropped on the worker: QObjects die on
+    // their own thread. The race is narrow, hence many rounds.
+    TempStore store;
+    QThread* const home = QThread::currentThread();
+    int released = 0;
+    int releasedElsewhere = 0;
+    const int rounds = 200;
+    for (int i = 0; i < rounds; ++i) {
+        auto get = std::make_shared<GetMarloObjects>();
+        get->setType(QCJobTemplate::typeId());
+        auto wrapper = std::make_shared<QtCommand>(get);
+        connect(wrapper.get(), &QObject::destroyed, this, [&]() {
+            ++released;
+            if (QThread::currentThread() != home)
+                ++releasedElsewhere;
+        }, Qt::DirectConnection);
+        store.model().commandDispatcher("")->dispatch(wrapper);
+    }
+    QTRY_COMPARE_WITH_TIMEOUT(released, rounds, 20000);
+    QCOMPARE(releasedElsewhere, 0);
 }
 
 void tst_Store::storeMarksAndConfiguresItsFile()
@@ -413,8 +402,11 @@ void tst_Store::folderTreeOperations()
     const auto duplicate = store.run(std::make_shared<CreateFolder>(type, "", "Samples"));
     QVERIFY(duplicate.error);
     QVERIFY(duplicate.error->message().contains(QStringLiteral("already exists")));
-    // The same name is free in the tree of another type.
-    QVERIFY(!folderIdOf(store.run(std::make_shared<CreateFolder>(Standard::typeId(), "", "Samples"))).empty());
+    // The same name is free in the tree of another type, but the trees do not mix.
+    const std::string standards = folderIdOf(store.run(std::make_shared<CreateFolder>(Standard::typeId(), "", "Samples")));
+    QVERIFY(!standards.empty());
+    QVERIFY(store.run(std::make_shared<CreateFolder>(type, standards, "Inside")).error);
+    QVERIFY(store.run(std::make_shared<MoveDirItem>(DirItemKind::Folder, samples, standards)).error);
 
     auto jobTemplate = makeTemplate("Door Panel");
     const auto saved = std::dynamic_pointer_cast<UpdateObjectResponse>(store.save(jobTemplate, &samples));
@@ -468,6 +460,32 @@ void tst_Store::deletingFolderDeletesItsObjects()
     QVERIFY(tree);
     QVERIFY(tree->folders().empty());
     QCOMPARE(tree->entries().size(), size_t(1));
+}
+
+void tst_Store::folderCycleDoesNotHangTheStore()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string first = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "First")));
+    const std::string second = folderIdOf(store.run(std::make_shared<CreateFolder>(type, first, "Second")));
+    auto nested = makeTemplate("Nested");
+    QVERIFY(store.save(nested, &second));
+    {
+        // A damaged file: each folder is the other's parent.
+        RawConnection raw(store.path());
+        QVERIFY(raw.exec(QStringLiteral("UPDATE folders SET parent_id = ? WHERE id = ?"),
+                         {QString::fromStdString(second), QString::fromStdString(first)}));
+    }
+    const auto tree = store.run(std::make_shared<GetDirectoryTree>(type));
+    QVERIFY(!tree.timedOut && tree.response);
+    const auto deleted = store.run(std::make_shared<DeleteDirItems>(std::vector<std::string>{first},
+                                                                    std::vector<std::string>{}));
+    QVERIFY(!deleted.timedOut);
+    QVERIFY(!deleted.error);
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(type);
+    get->setId(nested->id());
+    QVERIFY(store.run(get).error);
 }
 
 QTEST_GUILESS_MAIN(tst_Store)
