@@ -18,7 +18,7 @@ std::shared_ptr<Response> CreateFolder::execute(StoreDatabase& database)
         queries.requireFreeFolderName(m_objectType, m_parentId, m_name, std::string());
         database.run(QStringLiteral("INSERT INTO folders(id, object_type, parent_id, name) VALUES(?, ?, ?, ?)"),
                      {QString::fromStdString(folder.id), QString::fromStdString(m_objectType),
-                      m_parentId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(m_parentId)),
+                      DirectoryQueries::folderValue(m_parentId),
                       QString::fromStdString(m_name)});
     });
     return std::make_shared<FolderResponse>(folder);

@@ -5,14 +5,10 @@
 
 namespace vemi {
 
-namespace {
-
-QVariant nullable(const std::string& id)
+QVariant DirectoryQueries::folderValue(const std::string& folderId)
 {
-    return id.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(id));
+    return folderId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(folderId));
 }
-
-} // namespace
 
 void DirectoryQueries::requireFolder(const std::string& folderId, const std::string& objectType)
 {
@@ -33,7 +29,7 @@ void DirectoryQueries::requireFreeFolderName(const std::string& objectType, cons
         throw StoreError("a folder needs a name");
     const QVariant clash = m_database.scalar(
         QStringLiteral("SELECT 1 FROM folders WHERE object_type = ? AND parent_id IS ? AND name = ? AND id <> ?"),
-        {QString::fromStdString(objectType), nullable(parentId), QString::fromStdString(name),
+        {QString::fromStdString(objectType), folderValue(parentId), QString::fromStdString(name),
          QString::fromStdString(exceptId)});
     if (clash.isValid())
         throw StoreError("a folder named \"" + name + "\" already exists there");

@@ -1,5 +1,7 @@
 #pragma once
 
+#include <QVariant>
+
 #include <string>
 
 namespace vemi {
@@ -11,6 +13,9 @@ class DirectoryQueries
 {
 public:
     explicit DirectoryQueries(StoreDatabase& database) : m_database(database) {}
+
+    // A folder id as the tables hold it: NULL for the top level.
+    static QVariant folderValue(const std::string& folderId);
 
     // Throws StoreError when folderId names no folder of the object type (an
     // empty id is the top level, which every type has).

@@ -7,15 +7,6 @@
 
 namespace vemi {
 
-namespace {
-
-QVariant nullable(const std::string& id)
-{
-    return id.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(id));
-}
-
-} // namespace
-
 std::shared_ptr<Response> MoveDirItem::execute(StoreDatabase& database)
 {
     database.writeTransaction([&] {
@@ -36,7 +27,7 @@ void MoveDirItem::moveEntry(StoreDatabase& database)
         throw StoreError("the entry no longer exists");
     DirectoryQueries(database).requireFolder(m_targetFolderId, type.toString().toStdString());
     database.run(QStringLiteral("UPDATE dir_entries SET folder_id = ? WHERE id = ?"),
-                 {nullable(m_targetFolderId), QString::fromStdString(m_id)});
+                 {DirectoryQueries::folderValue(m_targetFolderId), QString::fromStdString(m_id)});
 }
 
 void MoveDirItem::moveFolder(StoreDatabase& database)
@@ -52,7 +43,7 @@ void MoveDirItem::moveFolder(StoreDatabase& database)
     queries.requireFreeFolderName(folder.value(0).toString().toStdString(), m_targetFolderId,
                                   folder.value(1).toString().toStdString(), m_id);
     database.run(QStringLiteral("UPDATE folders SET parent_id = ? WHERE id = ?"),
-                 {nullable(m_targetFolderId), QString::fromStdString(m_id)});
+                 {DirectoryQueries::folderValue(m_targetFolderId), QString::fromStdString(m_id)});
 }
 
 } // namespace vemi

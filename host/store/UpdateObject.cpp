@@ -13,15 +13,6 @@
 
 namespace vemi {
 
-namespace {
-
-QVariant folderValue(const std::string& folderId)
-{
-    return folderId.empty() ? QVariant(QVariant::String) : QVariant(QString::fromStdString(folderId));
-}
-
-} // namespace
-
 void UpdateObject::prepare()
 {
     if (!m_object)
@@ -62,7 +53,7 @@ std::shared_ptr<DirEntry> UpdateObject::fileInFolder(StoreDatabase& database)
         DirectoryQueries(database).requireFolder(folderId, m_type);
         entryId = QUuid::createUuid().toString(QUuid::WithoutBraces);
         database.run(QStringLiteral("INSERT INTO dir_entries(id, object_id, folder_id) VALUES(?, ?, ?)"),
-                     {entryId, QString::fromStdString(m_id), folderValue(folderId)});
+                     {entryId, QString::fromStdString(m_id), DirectoryQueries::folderValue(folderId)});
     }
     auto entry = std::make_shared<DirEntry>();
     entry->setId(entryId.toString().toStdString());

@@ -23,7 +23,6 @@
 
 #include <QIcon>
 
-#include <map>
 
 namespace vemi {
 

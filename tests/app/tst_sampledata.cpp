@@ -1,24 +1,21 @@
 #include "SampleData.h"
+#include "TempStore.h"
 
 #include "AppearanceValues.h"
 #include "CheckPoint.h"
 #include "CheckPointCouple.h"
 #include "ColorStandardsLibrary.h"
-#include "CommandDispatcher.h"
 #include "CreateFolder.h"
 #include "DirEntry.h"
 #include "DirectoryTreeResponse.h"
-#include "ErrorInfo.h"
 #include "GetDirectoryTree.h"
 #include "GetMarloObjects.h"
 #include "GetMarloObjectsResponse.h"
 #include "LabValue.h"
-#include "MarloModel.h"
 #include "MeasurementConfiguration.h"
 #include "Position.h"
 #include "PropertyLibrary.h"
 #include "QCJobTemplate.h"
-#include "QtCommand.h"
 #include "RGBValue.h"
 #include "SchematicImage.h"
 #include "Size.h"
@@ -26,12 +23,8 @@
 #include "TagDefinition.h"
 #include "TagValue.h"
 #include "ToleranceSet.h"
-#include "UpdateObject.h"
 
-#include <QEventLoop>
 #include <QImage>
-#include <QTemporaryDir>
-#include <QTimer>
 #include <QtTest>
 
 #include <set>
@@ -45,39 +38,19 @@ const std::vector<std::string> kSampleTypes = {
     TagDefinition::typeId(),   PropertyLibrary::typeId(), ToleranceSet::typeId(),
     MeasurementConfiguration::typeId()};
 
-std::shared_ptr<Response> runAndWait(CommandDispatcher& dispatcher, std::shared_ptr<Command> command)
+std::shared_ptr<DirectoryTreeResponse> tree(TempStore& store, const std::string& type)
 {
-    auto wrapper = std::make_shared<QtCommand>(std::move(command));
-    std::shared_ptr<Response> response;
-    QEventLoop loop;
-    QObject::connect(wrapper.get(), &QtCommand::responseReceived, &loop, [&](std::shared_ptr<Response> answer) {
-        response = std::move(answer);
-        loop.quit();
-    });
-    QObject::connect(wrapper.get(), &QtCommand::errorReceived, &loop, [&](std::shared_ptr<ErrorInfo> error) {
-        qWarning("store error: %s", qPrintable(error->message()));
-        loop.quit();
-    });
-    QTimer::singleShot(20000, &loop, &QEventLoop::quit);
-    dispatcher.dispatch(wrapper);
-    loop.exec();
-    return response;
-}
-
-std::shared_ptr<DirectoryTreeResponse> tree(CommandDispatcher& dispatcher, const std::string& type)
-{
-    return std::dynamic_pointer_cast<DirectoryTreeResponse>(
-        runAndWait(dispatcher, std::make_shared<GetDirectoryTree>(type)));
+    return std::dynamic_pointer_cast<DirectoryTreeResponse>(store.run(std::make_shared<GetDirectoryTree>(type)).response);
 }
 
 template <class T>
-std::vector<std::shared_ptr<T>> fetchAll(CommandDispatcher& dispatcher, int depth = 1)
+std::vector<std::shared_ptr<T>> fetchAll(TempStore& store, int depth = 1)
 {
     auto command = std::make_shared<GetMarloObjects>();
     command->setType(T::typeId());
     command->setDepth(depth);
     std::vector<std::shared_ptr<T>> objects;
-    if (auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(runAndWait(dispatcher, command))) {
+    if (auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(command).response)) {
         for (const auto& object : response->objects())
             objects.push_back(std::dynamic_pointer_cast<T>(object));
     }
@@ -85,11 +58,11 @@ std::vector<std::shared_ptr<T>> fetchAll(CommandDispatcher& dispatcher, int dept
 }
 
 // Folders plus entries over every tree the sample data writes to; -1 when a tree cannot be read.
-int itemCount(CommandDispatcher& dispatcher)
+int itemCount(TempStore& store)
 {
     int count = 0;
     for (const std::string& type : kSampleTypes) {
-        auto response = tree(dispatcher, type);
+        auto response = tree(store, type);
         if (!response)
             return -1;
         count += int(response->folders().size() + response->entries().size());
@@ -129,18 +102,13 @@ private slots:
     void failureReportsStoreMessage();
 
 private:
-    QTemporaryDir m_dir;
-    std::unique_ptr<MarloModel> m_store;
-    std::shared_ptr<CommandDispatcher> m_dispatcher;
+    std::unique_ptr<TempStore> m_seeded;
 };
 
 void tst_SampleData::initTestCase()
 {
-    QVERIFY(m_dir.isValid());
-    m_store = std::make_unique<MarloModel>(m_dir.filePath("seeded.sqlite"));
-    QCOMPARE(m_store->open(), QString());
-    m_dispatcher = m_store->commandDispatcher("");
-    QCOMPARE(SampleData::seedIfEmpty(*m_store), QString());
+    m_seeded = std::make_unique<TempStore>();
+    QCOMPARE(SampleData::seedIfEmpty(m_seeded->model()), QString());
 }
 
 void tst_SampleData::fillsEachTreeInOneFolder_data()
@@ -166,7 +134,7 @@ void tst_SampleData::fillsEachTreeInOneFolder()
     QFETCH(QString, folder);
     QFETCH(int, entries);
 
-    auto response = tree(*m_dispatcher, type.toStdString());
+    auto response = tree(*m_seeded, type.toStdString());
     QVERIFY(response);
     QCOMPARE(int(response->folders().size()), 1);
     QCOMPARE(QString::fromStdString(response->folders().front().name), folder);
@@ -187,7 +155,7 @@ void tst_SampleData::templatesAreComplete()
     QFETCH(QString, name);
 
     std::shared_ptr<QCJobTemplate> jobTemplate;
-    for (const auto& candidate : fetchAll<QCJobTemplate>(*m_dispatcher)) {
+    for (const auto& candidate : fetchAll<QCJobTemplate>(*m_seeded)) {
         if (candidate && candidate->name() == name.toStdString())
             jobTemplate = candidate;
     }
@@ -208,7 +176,7 @@ void tst_SampleData::templatesAreComplete()
 
     // The template's standards are copies of stored standards, not new objects.
     std::set<std::string> storedStandardIds;
-    for (const auto& standard : fetchAll<Standard>(*m_dispatcher))
+    for (const auto& standard : fetchAll<Standard>(*m_seeded))
         storedStandardIds.insert(standard->id());
     std::map<std::string, std::shared_ptr<Standard>> standards;
     for (const auto& standard : jobTemplate->standards()) {
@@ -274,12 +242,12 @@ void tst_SampleData::librariesResolveTheirMembers()
     // Names come only from the stored members: an unresolved stand-in has none.
     QStringList names;
     if (standardsLibrary) {
-        const auto libraries = fetchAll<ColorStandardsLibrary>(*m_dispatcher, 2);
+        const auto libraries = fetchAll<ColorStandardsLibrary>(*m_seeded, 2);
         QCOMPARE(int(libraries.size()), 1);
         for (const auto& standard : libraries.front()->standards())
             names << QString::fromStdString(standard->name());
     } else {
-        const auto libraries = fetchAll<PropertyLibrary>(*m_dispatcher, 2);
+        const auto libraries = fetchAll<PropertyLibrary>(*m_seeded, 2);
         QCOMPARE(int(libraries.size()), 1);
         for (const auto& definition : libraries.front()->properties())
             names << QString::fromStdString(definition->name());
@@ -308,7 +276,7 @@ void tst_SampleData::displayColoursFollowLab()
     QFETCH(QColor, expected);
 
     std::shared_ptr<Standard> standard;
-    for (const auto& candidate : fetchAll<Standard>(*m_dispatcher)) {
+    for (const auto& candidate : fetchAll<Standard>(*m_seeded)) {
         if (candidate->name() == name.toStdString())
             standard = candidate;
     }
@@ -328,10 +296,10 @@ void tst_SampleData::displayColoursFollowLab()
 
 void tst_SampleData::secondRunAddsNothing()
 {
-    const int before = itemCount(*m_dispatcher);
+    const int before = itemCount(*m_seeded);
     QVERIFY(before > 0);
-    QCOMPARE(SampleData::seedIfEmpty(*m_store), QString());
-    QCOMPARE(itemCount(*m_dispatcher), before);
+    QCOMPARE(SampleData::seedIfEmpty(m_seeded->model()), QString());
+    QCOMPARE(itemCount(*m_seeded), before);
 }
 
 void tst_SampleData::storeWithTemplateTreeIsLeftAlone_data()
@@ -345,40 +313,31 @@ void tst_SampleData::storeWithTemplateTreeIsLeftAlone()
 {
     QFETCH(bool, folderOnly);
 
-    MarloModel store(m_dir.filePath(QStringLiteral("used-%1.sqlite").arg(folderOnly)));
-    QCOMPARE(store.open(), QString());
-    auto dispatcher = store.commandDispatcher("");
+    TempStore store;
     if (folderOnly) {
-        QVERIFY(runAndWait(*dispatcher, std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", "Mine")));
+        QVERIFY(store.run(std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", "Mine")).response);
     } else {
-        auto update = std::make_shared<UpdateObject>();
         auto jobTemplate = std::make_shared<QCJobTemplate>();
         jobTemplate->setName("Bumper");
-        update->setObject(jobTemplate);
-        update->setFolderId("");
-        QVERIFY(runAndWait(*dispatcher, update));
+        const std::string topLevel;
+        QVERIFY(store.save(jobTemplate, &topLevel));
     }
-    QCOMPARE(itemCount(*dispatcher), 1);
+    QCOMPARE(itemCount(store), 1);
 
-    QCOMPARE(SampleData::seedIfEmpty(store), QString());
-    QCOMPARE(itemCount(*dispatcher), 1);
+    QCOMPARE(SampleData::seedIfEmpty(store.model()), QString());
+    QCOMPARE(itemCount(store), 1);
 }
 
 void tst_SampleData::failureReportsStoreMessage()
 {
-    const QString path = m_dir.filePath("read-only.sqlite");
-    {
-        MarloModel created(path);
-        QCOMPARE(created.open(), QString());
-    }
-    StoreOptions options;
-    options.readOnly = true;
-    MarloModel store(path, options);
-    QCOMPARE(store.open(), QString());
+    TempStore store;
+    StoreOptions readOnly;
+    readOnly.readOnly = true;
+    store.reopen(readOnly);
 
-    const QString message = SampleData::seedIfEmpty(store);
+    const QString message = SampleData::seedIfEmpty(store.model());
     QVERIFY2(message.contains("read-only"), qPrintable(message));
-    QCOMPARE(itemCount(*store.commandDispatcher("")), 0);
+    QCOMPARE(itemCount(store), 0);
 }
 
 QTEST_MAIN(tst_SampleData)
