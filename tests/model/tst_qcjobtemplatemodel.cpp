@@ -1,12 +1,20 @@
+#include "CheckListText.h"
 #include "RecordingDispatcher.h"
 #include "TempStore.h"
 
+#include "CheckPoint.h"
 #include "ColorStandardsLibrary.h"
 #include "GetMarloObjects.h"
+#include "MeasurementConfiguration.h"
+#include "Position.h"
 #include "QCJobTemplate.h"
 #include "QCJobTemplateModel.h"
+#include "SchematicImage.h"
+#include "Size.h"
+#include "Standard.h"
 #include "TagDefinition.h"
 #include "TagValue.h"
+#include "ToleranceSet.h"
 #include "UpdateObject.h"
 
 #include <QtTest>
@@ -29,6 +37,9 @@ private slots:
     void editsChangeTemplateSilently_data();
     void editsChangeTemplateSilently();
     void notifyEmitsOnceAndChangesNothing();
+    void measurementConfigurationIsAnnounced_data();
+    void measurementConfigurationIsAnnounced();
+    void editedTemplateSurvivesTheStore();
 
 private:
     std::unique_ptr<TempStore> m_store;
@@ -114,6 +125,7 @@ using Edit = std::function<void(QCJobTemplateModel&)>;
 using Check = std::function<bool(const QCJobTemplate&)>;
 Q_DECLARE_METATYPE(Edit)
 Q_DECLARE_METATYPE(Check)
+Q_DECLARE_METATYPE(std::shared_ptr<vemi::MeasurementConfiguration>)
 
 void tst_QCJobTemplateModel::editsChangeTemplateSilently_data()
 {
@@ -132,6 +144,38 @@ void tst_QCJobTemplateModel::editsChangeTemplateSilently_data()
         << Check([definition](const QCJobTemplate& t) { return t.tagDefinitions() == std::vector{definition}; });
     QTest::newRow("tag values") << Edit([value](QCJobTemplateModel& m) { m.setTagValues({value}); })
                                 << Check([value](const QCJobTemplate& t) { return t.tagValues() == std::vector{value}; });
+
+    const auto red = std::make_shared<Standard>();
+    const auto blue = std::make_shared<Standard>();
+    const auto library = std::make_shared<ColorStandardsLibrary>();
+    library->setStandards({blue, red});
+    const auto emptyLibrary = std::make_shared<ColorStandardsLibrary>();
+    QTest::newRow("the same standard added twice gives two entries")
+        << Edit([red](QCJobTemplateModel& m) { m.addStandard(red); m.addStandard(red); })
+        << Check([red](const QCJobTemplate& t) { return t.standards() == std::vector{red, red}; });
+    QTest::newRow("a library replaces all standards in its order")
+        << Edit([red, library](QCJobTemplateModel& m) { m.addStandard(red); m.setStandardsFromLibrary(library); })
+        << Check([red, blue](const QCJobTemplate& t) { return t.standards() == std::vector{blue, red}; });
+    QTest::newRow("a library without standards keeps them")
+        << Edit([red, emptyLibrary](QCJobTemplateModel& m) { m.addStandard(red); m.setStandardsFromLibrary(emptyLibrary); })
+        << Check([red](const QCJobTemplate& t) { return t.standards() == std::vector{red}; });
+    QTest::newRow("remove all standards")
+        << Edit([red](QCJobTemplateModel& m) { m.addStandard(red); m.removeAllStandards(); })
+        << Check([](const QCJobTemplate& t) { return t.standards().empty(); });
+
+    const auto tolerance = std::make_shared<ToleranceSet>();
+    QTest::newRow("shared tolerance sets")
+        << Edit([tolerance](QCJobTemplateModel& m) { m.setSharedToleranceSets({tolerance}); })
+        << Check([tolerance](const QCJobTemplate& t) { return t.sharedToleranceSets() == std::vector{tolerance}; });
+    QTest::newRow("remove all tolerance sets, shared and private")
+        << Edit([tolerance](QCJobTemplateModel& m) {
+               m.setSharedToleranceSets({tolerance});
+               m.jobTemplate()->setPrivateToleranceSets({tolerance});
+               m.removeAllToleranceSets();
+           })
+        << Check([](const QCJobTemplate& t) {
+               return t.sharedToleranceSets().empty() && t.privateToleranceSets().empty();
+           });
 }
 
 void tst_QCJobTemplateModel::editsChangeTemplateSilently()
@@ -164,5 +208,74 @@ void tst_QCJobTemplateModel::notifyEmitsOnceAndChangesNothing()
     QCOMPARE(model.jobTemplate(), jobTemplate);
 }
 
-QTEST_GUILESS_MAIN(tst_QCJobTemplateModel)
+void tst_QCJobTemplateModel::measurementConfigurationIsAnnounced_data()
+{
+    QTest::addColumn<std::shared_ptr<MeasurementConfiguration>>("configuration");
+    QTest::newRow("a configuration") << std::make_shared<MeasurementConfiguration>();
+    QTest::newRow("none removes the previous one") << std::shared_ptr<MeasurementConfiguration>();
+}
+
+void tst_QCJobTemplateModel::measurementConfigurationIsAnnounced()
+{
+    QFETCH(std::shared_ptr<MeasurementConfiguration>, configuration);
+    QCJobTemplateModel model(m_store->model());
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setMeasurementConfiguration(std::make_shared<MeasurementConfiguration>());
+    model.setJobTemplate(jobTemplate);
+    QSignalSpy loaded(&model, &QCJobTemplateModel::sgMeasurementConfigLoaded);
+    QSignalSpy savable(&model, &QCJobTemplateModel::sgSetTemplateSavable);
+
+    model.setMeasurementConfiguration(configuration);
+
+    QCOMPARE(model.measurementConfiguration(), configuration);
+    QCOMPARE(jobTemplate->measurementConfiguration(), configuration);
+    QCOMPARE(loaded.count(), 1);
+    QCOMPARE(savable.count(), 0);
+}
+
+void tst_QCJobTemplateModel::editedTemplateSurvivesTheStore()
+{
+    TempStore store;
+    QCJobTemplateModel model(store.model());
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    model.setJobTemplate(jobTemplate);
+    for (const char* name : {"P0", "P1", "P2", "P3"})
+        model.addCheckPoint(name);
+    model.coupleCheckPoints(0, 2, "A");
+    model.swapCoupledCheckPoints(0);
+    QImage area(40, 30, QImage::Format_RGB32);
+    area.fill(qRgb(180, 20, 60));
+    QVERIFY(model.setCheckPointImage(2, QPixmap::fromImage(area), QRect(120, 85, 40, 30)));
+    const QString schematicPath = store.folder() + "/part.rev.JPG";
+    QFile schematic(schematicPath);
+    QVERIFY(schematic.open(QIODevice::WriteOnly) && schematic.write(QByteArray(300, 'S')) == 300);
+    schematic.close();
+    QVERIFY(model.loadSchematicImage("part.rev.JPG", schematicPath));
+    QCOMPARE(checkListText(*jobTemplate), QStringLiteral("A[P2<CP1> P0<CP2>], P1, P3"));
+
+    QVERIFY(store.save(jobTemplate));
+    store.reopen();
+    const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
+
+    QVERIFY(stored);
+    QCOMPARE(checkListText(*stored), checkListText(*jobTemplate));
+    const auto before = jobTemplate->checkPoints();
+    const auto after = stored->checkPoints();
+    QCOMPARE(after.size(), before.size());
+    for (size_t i = 0; i < after.size(); ++i) {
+        QCOMPARE(after[i]->schematicImage()->imageData(), before[i]->schematicImage()->imageData());
+        QCOMPARE(after[i]->schematicImage()->format(), before[i]->schematicImage()->format());
+        QCOMPARE(after[i]->position()->x(), before[i]->position()->x());
+        QCOMPARE(after[i]->position()->y(), before[i]->position()->y());
+        QCOMPARE(after[i]->size()->width(), before[i]->size()->width());
+        QCOMPARE(after[i]->size()->height(), before[i]->size()->height());
+    }
+    QCOMPARE(after[2]->position()->x(), 120);
+    QCOMPARE(after[2]->schematicImage()->format(), std::string("PNG"));
+    QCOMPARE(stored->schematicImage()->imageData(), std::vector<unsigned char>(300, 'S'));
+    QCOMPARE(stored->schematicImage()->format(), std::string("JPG"));
+    QCOMPARE(stored->schematicImage()->name(), std::string("part.rev.JPG"));
+}
+
+QTEST_MAIN(tst_QCJobTemplateModel)
 #include "tst_qcjobtemplatemodel.moc"
