@@ -349,6 +349,9 @@ std::vector<std::shared_ptr<vemi::Standard>> QCJobTemplateModel::standards() con
 
 void QCJobTemplateModel::addStandard(const std::shared_ptr<vemi::Standard>& standard)
 {
+    // The editors and the stored template expect every entry to be a standard.
+    if (!standard)
+        return;
     auto list = m_template->standards();
     list.push_back(standard);
     m_template->setStandards(list);

@@ -96,7 +96,7 @@ public:
     // Standards, tolerances and the measurement configuration; only
     // setMeasurementConfiguration emits (sgMeasurementConfigLoaded).
     std::vector<std::shared_ptr<vemi::Standard>> standards() const;
-    // Duplicates are the caller's to avoid.
+    // Duplicates are the caller's to avoid; a null standard is ignored.
     void addStandard(const std::shared_ptr<vemi::Standard>& standard);
     // Replaces the standards by the library's, unless the library has none.
     void setStandardsFromLibrary(const std::shared_ptr<vemi::ColorStandardsLibrary>& library);

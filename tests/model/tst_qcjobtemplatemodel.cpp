@@ -153,6 +153,9 @@ void tst_QCJobTemplateModel::editsChangeTemplateSilently_data()
     QTest::newRow("the same standard added twice gives two entries")
         << Edit([red](QCJobTemplateModel& m) { m.addStandard(red); m.addStandard(red); })
         << Check([red](const QCJobTemplate& t) { return t.standards() == std::vector{red, red}; });
+    QTest::newRow("a null standard is not added")
+        << Edit([red](QCJobTemplateModel& m) { m.addStandard(red); m.addStandard(nullptr); })
+        << Check([red](const QCJobTemplate& t) { return t.standards() == std::vector{red}; });
     QTest::newRow("a library replaces all standards in its order")
         << Edit([red, library](QCJobTemplateModel& m) { m.addStandard(red); m.setStandardsFromLibrary(library); })
         << Check([red, blue](const QCJobTemplate& t) { return t.standards() == std::vector{blue, red}; });
