@@ -238,6 +238,8 @@ void tst_CheckList::checkpointIndexOutOfRangeThrows_data()
     QTest::newRow("read at a negative index") << Edit([](QCJobTemplateModel& m) { m.checkPointAt(-1); });
     QTest::newRow("rename past the end") << Edit([](QCJobTemplateModel& m) { m.renameCheckPoint(4, "X"); });
     QTest::newRow("rename at a negative index") << Edit([](QCJobTemplateModel& m) { m.renameCheckPoint(-1, "X"); });
+    QTest::newRow("cut-out past the end")
+        << Edit([](QCJobTemplateModel& m) { m.setCheckPointImage(4, QPixmap(4, 4), QRect(0, 0, 4, 4)); });
 }
 
 void tst_CheckList::checkpointIndexOutOfRangeThrows()
@@ -267,5 +269,5 @@ void tst_CheckList::swappingMembersReplacesTheCouple()
     QCOMPARE(after->name(), std::string("A"));
 }
 
-QTEST_GUILESS_MAIN(tst_CheckList)
+QTEST_MAIN(tst_CheckList)
 #include "tst_checklist.moc"

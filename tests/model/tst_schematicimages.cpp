@@ -11,8 +11,6 @@
 
 #include <QtTest>
 
-#include <functional>
-#include <stdexcept>
 
 using namespace vemi;
 
@@ -65,7 +63,6 @@ private slots:
     void failedSaveOfClearedPictureIsReported();
     void checkPointAreaIsStoredAsPng();
     void emptyAreaChangesNothing();
-    void areaForCheckpointOutOfRangeThrows();
 
 private:
     std::unique_ptr<TempStore> m_store;
@@ -98,7 +95,6 @@ void tst_SchematicImages::loadKeepsBytesAndTakesFormatFromPath_data()
     QTest::addColumn<QString>("relativePath");
     QTest::addColumn<QString>("format");
     QTest::newRow("last of several dots, case kept") << "part.rev.JPG" << "JPG";
-    QTest::newRow("lower-case extension") << "panel.png" << "png";
     QTest::newRow("no dot gives the whole path") << "schematic" << "schematic";
     QTest::newRow("dot in a folder name only") << "v1.2/schematic" << "2/schematic";
 }
@@ -235,17 +231,6 @@ void tst_SchematicImages::emptyAreaChangesNothing()
 
     QCOMPARE(checkPoint->schematicImage()->imageData(), std::vector<unsigned char>({7, 7, 7}));
     QCOMPARE(checkPoint->position(), position);
-    QCOMPARE(savable.count(), 0);
-}
-
-void tst_SchematicImages::areaForCheckpointOutOfRangeThrows()
-{
-    m_model->addCheckPoint("P0");
-    QSignalSpy savable(m_model.get(), &QCJobTemplateModel::sgSetTemplateSavable);
-    QVERIFY_EXCEPTION_THROWN(m_model->setCheckPointImage(1, checkeredArea(4, 4), QRect(0, 0, 4, 4)),
-                             std::out_of_range);
-    QVERIFY_EXCEPTION_THROWN(m_model->setCheckPointImage(-1, checkeredArea(4, 4), QRect(0, 0, 4, 4)),
-                             std::out_of_range);
     QCOMPARE(savable.count(), 0);
 }
 
