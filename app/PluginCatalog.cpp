@@ -1,6 +1,6 @@
-#include "PluginCatalog.h"
+#include "app/PluginCatalog.h"
 
-#include "ClientInterface.h"
+#include "host/client/ClientInterface.h"
 
 #include <QDir>
 #include <QFileInfo>

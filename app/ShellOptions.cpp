@@ -1,6 +1,6 @@
-#include "ShellOptions.h"
+#include "app/ShellOptions.h"
 
-#include "MarloModel.h"
+#include "host/store/MarloModel.h"
 
 #include <QCommandLineParser>
 #include <QCoreApplication>

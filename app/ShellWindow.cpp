@@ -1,9 +1,9 @@
-#include "ShellWindow.h"
+#include "app/ShellWindow.h"
 
-#include "AppWidget.h"
-#include "ClientInterface.h"
-#include "CorvoTopBar.h"
-#include "ImageRepository.h"
+#include "host/client/AppWidget.h"
+#include "host/client/ClientInterface.h"
+#include "host/client/CorvoTopBar.h"
+#include "host/widgets/ImageRepository.h"
 
 #include <QCloseEvent>
 #include <QFile>

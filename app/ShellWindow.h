@@ -1,6 +1,6 @@
 #pragma once
 
-#include "PluginCatalog.h"
+#include "app/PluginCatalog.h"
 
 #include <QMainWindow>
 

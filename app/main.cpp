@@ -1,10 +1,10 @@
-#include "GeneralSettings.h"
-#include "MarloModel.h"
-#include "PluginCatalog.h"
-#include "SampleData.h"
-#include "ShellOptions.h"
-#include "SettingsManager.h"
-#include "ShellWindow.h"
+#include "host/client/GeneralSettings.h"
+#include "host/store/MarloModel.h"
+#include "app/PluginCatalog.h"
+#include "app/sampledata/SampleData.h"
+#include "app/ShellOptions.h"
+#include "host/client/SettingsManager.h"
+#include "app/ShellWindow.h"
 
 #include <QApplication>
 #include <QTimer>

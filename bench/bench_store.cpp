@@ -6,15 +6,15 @@
 // 2. How long the caller's event loop stalls while such a save runs, as a
 //    share of the whole save.
 
-#include "CommandDispatcher.h"
-#include "ErrorInfo.h"
-#include "GetMarloObject.h"
-#include "GetMarloObjectResponse.h"
-#include "MarloModel.h"
-#include "QCJobTemplate.h"
-#include "QtCommand.h"
-#include "SchematicImage.h"
-#include "UpdateObject.h"
+#include "host/store/CommandDispatcher.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/GetMarloObject.h"
+#include "host/store/GetMarloObjectResponse.h"
+#include "host/store/MarloModel.h"
+#include "host/domain/QCJobTemplate.h"
+#include "host/store/QtCommand.h"
+#include "host/domain/SchematicImage.h"
+#include "host/store/UpdateObject.h"
 
 #include <benchmark/benchmark.h>
 #include <sqlite3.h>

@@ -1,7 +1,7 @@
-#include "QCJobTemplateDetailWidget.h"
+#include "detail/QCJobTemplateDetailWidget.h"
 
-#include "QCJobTemplate.h"
-#include "QCJobTemplateModel.h"
+#include "host/domain/QCJobTemplate.h"
+#include "model/QCJobTemplateModel.h"
 
 #include <QLabel>
 #include <QVBoxLayout>

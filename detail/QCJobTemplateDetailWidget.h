@@ -13,8 +13,8 @@ class GeneralSettings;
 class MarloModel;
 class QCJobTemplate;
 
-// The editor of the job template that is open in the browser. For now it
-// shows which template is open; the editing panes build on it.
+// The editor of the job template that is open in the browser. It shows
+// which template is open; the editing panes build on it.
 class QCJobTemplateDetailWidget : public QWidget
 {
     Q_OBJECT

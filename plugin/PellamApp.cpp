@@ -1,10 +1,10 @@
-#include "PellamApp.h"
+#include "plugin/PellamApp.h"
 
-#include "ImageRepository.h"
-#include "PellamAppWidget.h"
-#include "PellamSettings.h"
-#include "SettingsManager.h"
-#include "Version.h"
+#include "host/widgets/ImageRepository.h"
+#include "plugin/PellamAppWidget.h"
+#include "plugin/PellamSettings.h"
+#include "host/client/SettingsManager.h"
+#include "host/client/Version.h"
 
 #include <QIcon>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ClientInterface.h"
+#include "host/client/ClientInterface.h"
 
 #include <QObject>
 

@@ -1,7 +1,7 @@
-#include "PellamAppWidget.h"
+#include "plugin/PellamAppWidget.h"
 
-#include "CorvoTopBar.h"
-#include "PellamWidget.h"
+#include "host/client/CorvoTopBar.h"
+#include "plugin/PellamWidget.h"
 
 #include <QAction>
 #include <QMenu>

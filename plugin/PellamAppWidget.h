@@ -1,6 +1,6 @@
 #pragma once
 
-#include "AppWidget.h"
+#include "host/client/AppWidget.h"
 
 #include <memory>
 

@@ -1,4 +1,4 @@
-#include "PellamSettings.h"
+#include "plugin/PellamSettings.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CommonSettings.h"
+#include "host/client/CommonSettings.h"
 
 #include <QObject>
 

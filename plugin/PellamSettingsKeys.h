@@ -8,22 +8,6 @@ namespace PellamKeys {
 // Keys of the plug-in's state in the host's QSettings store. Each exists once
 // for the whole plug-in, from library load to unload.
 extern const QString MainSplitterState;
-extern const QString HorizontalSplitterState;
-extern const QString QcJobTemplateSplitterState;
-extern const QString DialogSplitterState;
-
-// Groups of the pickers' remembered positions, each holding the two keys below.
-extern const QString LibraryPathGroup;
-extern const QString StandardPathGroup;
-extern const QString TolerancePathGroup;
-extern const QString PropertyPathGroup;
-extern const QString LastSelectedPath;
-extern const QString DispatcherId;
-
-// The property picker's two entries addressed by full key (the same entries
-// as PropertyPathGroup + LastSelectedPath / DispatcherId).
-extern const QString PropertyLastSelectedPath;
-extern const QString PropertyDispatcherId;
 
 } // namespace PellamKeys
 } // namespace vemi

@@ -1,12 +1,12 @@
-#include "PellamWidget.h"
+#include "plugin/PellamWidget.h"
 
-#include "DirEntryBrowserWidget.h"
-#include "DirEntryTreeModel.h"
-#include "PellamSettingsKeys.h"
-#include "QCJobTemplate.h"
-#include "QCJobTemplateDetailWidget.h"
-#include "QCJobTemplateModel.h"
-#include "SchematicImage.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
+#include "host/widgets/DirEntryTreeModel.h"
+#include "plugin/PellamSettingsKeys.h"
+#include "host/domain/QCJobTemplate.h"
+#include "detail/QCJobTemplateDetailWidget.h"
+#include "model/QCJobTemplateModel.h"
+#include "host/domain/SchematicImage.h"
 
 #include <QAction>
 #include <QIcon>

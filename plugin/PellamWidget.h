@@ -1,7 +1,7 @@
 #pragma once
 
-#include "BaseObjectTreeModel.h"
-#include "DirEntryBrowserInterface.h"
+#include "host/widgets/BaseObjectTreeModel.h"
+#include "host/widgets/DirEntryBrowserInterface.h"
 
 #include <QVector>
 #include <QWidget>

@@ -1,4 +1,4 @@
-#include "AppWidget.h"
+#include "host/client/AppWidget.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "SupportedInstruments.h"
+#include "host/client/SupportedInstruments.h"
 
 #include <QString>
 #include <QWidget>

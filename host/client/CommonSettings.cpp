@@ -1,6 +1,6 @@
-#include "CommonSettings.h"
+#include "host/client/CommonSettings.h"
 
-#include "SettingsList.h"
+#include "host/client/SettingsList.h"
 
 namespace vemi {
 

@@ -1,4 +1,4 @@
-#include "CorvoTopBar.h"
+#include "host/client/CorvoTopBar.h"
 
 #include <QMenu>
 

@@ -1,7 +1,7 @@
-#include "SettingsManager.h"
+#include "host/client/SettingsManager.h"
 
-#include "GeneralSettings.h"
-#include "MarloModel.h"
+#include "host/client/GeneralSettings.h"
+#include "host/store/MarloModel.h"
 
 #include <QSettings>
 #include <QStringList>

@@ -1,4 +1,4 @@
-#include "SupportedInstruments.h"
+#include "host/client/SupportedInstruments.h"
 
 namespace vemi {
 

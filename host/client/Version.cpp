@@ -1,4 +1,4 @@
-#include "Version.h"
+#include "host/client/Version.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
-#include "AppearanceValues.h"
+#include "host/domain/AppearanceValues.h"
 
-#include "ColorValue.h"
-#include "ObjectCodec.h"
+#include "host/domain/ColorValue.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

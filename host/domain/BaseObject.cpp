@@ -1,6 +1,6 @@
-#include "BaseObject.h"
+#include "host/domain/BaseObject.h"
 
-#include "Header.h"
+#include "host/domain/Header.h"
 
 namespace vemi {
 

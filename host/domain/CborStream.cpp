@@ -1,7 +1,7 @@
-#include "CborStream.h"
+#include "host/domain/CborStream.h"
 
-#include "DecodeError.h"
-#include "DetachedBytes.h"
+#include "host/domain/DecodeError.h"
+#include "host/domain/DetachedBytes.h"
 
 #include <QCborArray>
 #include <QCborMap>

@@ -1,1 +1,1 @@
-#include "CheckListItem.h"
+#include "host/domain/CheckListItem.h"

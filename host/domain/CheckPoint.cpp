@@ -1,10 +1,10 @@
-#include "CheckPoint.h"
+#include "host/domain/CheckPoint.h"
 
-#include "ObjectCodec.h"
-#include "Position.h"
-#include "SchematicImage.h"
-#include "Size.h"
-#include "Standard.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/Position.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Size.h"
+#include "host/domain/Standard.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CheckListItem.h"
+#include "host/domain/CheckListItem.h"
 
 #include <memory>
 

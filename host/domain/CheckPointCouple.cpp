@@ -1,7 +1,7 @@
-#include "CheckPointCouple.h"
+#include "host/domain/CheckPointCouple.h"
 
-#include "CheckPoint.h"
-#include "ObjectCodec.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

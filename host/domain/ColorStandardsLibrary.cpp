@@ -1,7 +1,7 @@
-#include "ColorStandardsLibrary.h"
+#include "host/domain/ColorStandardsLibrary.h"
 
-#include "ObjectCodec.h"
-#include "Standard.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/Standard.h"
 
 namespace vemi {
 

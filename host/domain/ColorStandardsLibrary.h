@@ -1,6 +1,6 @@
 #pragma once
 
-#include "NamedObject.h"
+#include "host/domain/NamedObject.h"
 
 #include <memory>
 #include <vector>

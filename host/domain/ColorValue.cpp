@@ -1,1 +1,1 @@
-#include "ColorValue.h"
+#include "host/domain/ColorValue.h"

@@ -1,6 +1,6 @@
-#include "ColorimetricCondition.h"
+#include "host/domain/ColorimetricCondition.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 #include <utility>
 

@@ -1,6 +1,6 @@
-#include "DetachedBytes.h"
+#include "host/domain/DetachedBytes.h"
 
-#include "DecodeError.h"
+#include "host/domain/DecodeError.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "SharedBytes.h"
+#include "host/domain/SharedBytes.h"
 
 #include <QCborValue>
 

@@ -1,6 +1,6 @@
-#include "DirEntry.h"
+#include "host/domain/DirEntry.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

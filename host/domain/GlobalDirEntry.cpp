@@ -1,6 +1,6 @@
-#include "GlobalDirEntry.h"
+#include "host/domain/GlobalDirEntry.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "DirEntry.h"
+#include "host/domain/DirEntry.h"
 
 namespace vemi {
 

@@ -1,4 +1,4 @@
-#include "Header.h"
+#include "host/domain/Header.h"
 
 #include <utility>
 

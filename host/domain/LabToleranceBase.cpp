@@ -1,7 +1,7 @@
-#include "LabToleranceBase.h"
+#include "host/domain/LabToleranceBase.h"
 
-#include "ColorimetricCondition.h"
-#include "ObjectCodec.h"
+#include "host/domain/ColorimetricCondition.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Tolerance.h"
+#include "host/domain/Tolerance.h"
 
 #include <memory>
 

@@ -1,6 +1,6 @@
-#include "LabValue.h"
+#include "host/domain/LabValue.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

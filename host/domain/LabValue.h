@@ -1,6 +1,6 @@
 #pragma once
 
-#include "ColorValue.h"
+#include "host/domain/ColorValue.h"
 
 #include <string>
 

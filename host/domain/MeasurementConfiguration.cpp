@@ -1,7 +1,7 @@
-#include "MeasurementConfiguration.h"
+#include "host/domain/MeasurementConfiguration.h"
 
-#include "ObjectCodec.h"
-#include "Property.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/Property.h"
 
 namespace vemi {
 

@@ -1,9 +1,9 @@
-#include "NamedObject.h"
+#include "host/domain/NamedObject.h"
 
-#include "Header.h"
-#include "ObjectCodec.h"
-#include "TagDefinition.h"
-#include "TagValue.h"
+#include "host/domain/Header.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/TagDefinition.h"
+#include "host/domain/TagValue.h"
 
 namespace vemi {
 

@@ -1,8 +1,8 @@
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
-#include "CborStream.h"
-#include "Header.h"
-#include "ObjectRegistry.h"
+#include "host/domain/CborStream.h"
+#include "host/domain/Header.h"
+#include "host/domain/ObjectRegistry.h"
 
 namespace vemi {
 

@@ -1,9 +1,9 @@
 #pragma once
 
-#include "BaseObject.h"
-#include "DecodeError.h"
-#include "ObjectSnapshot.h"
-#include "SharedBytes.h"
+#include "host/domain/BaseObject.h"
+#include "host/domain/DecodeError.h"
+#include "host/domain/ObjectSnapshot.h"
+#include "host/domain/SharedBytes.h"
 
 #include <QByteArray>
 #include <QCborArray>

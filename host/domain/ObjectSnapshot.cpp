@@ -1,6 +1,6 @@
-#include "ObjectSnapshot.h"
+#include "host/domain/ObjectSnapshot.h"
 
-#include "CborStream.h"
+#include "host/domain/CborStream.h"
 
 namespace vemi {
 

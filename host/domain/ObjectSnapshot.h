@@ -1,6 +1,6 @@
 #pragma once
 
-#include "DetachedBytes.h"
+#include "host/domain/DetachedBytes.h"
 
 #include <QByteArray>
 #include <QCborValue>

@@ -1,6 +1,6 @@
-#include "Position.h"
+#include "host/domain/Position.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

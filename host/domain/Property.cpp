@@ -1,6 +1,6 @@
-#include "Property.h"
+#include "host/domain/Property.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 #include <utility>
 

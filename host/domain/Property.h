@@ -1,6 +1,6 @@
 #pragma once
 
-#include "BaseObject.h"
+#include "host/domain/BaseObject.h"
 
 namespace vemi {
 

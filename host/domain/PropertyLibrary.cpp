@@ -1,7 +1,7 @@
-#include "PropertyLibrary.h"
+#include "host/domain/PropertyLibrary.h"
 
-#include "ObjectCodec.h"
-#include "TagDefinition.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/TagDefinition.h"
 
 namespace vemi {
 

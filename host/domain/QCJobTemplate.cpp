@@ -1,13 +1,13 @@
-#include "QCJobTemplate.h"
+#include "host/domain/QCJobTemplate.h"
 
-#include "CheckListItem.h"
-#include "CheckPoint.h"
-#include "CheckPointCouple.h"
-#include "MeasurementConfiguration.h"
-#include "ObjectCodec.h"
-#include "SchematicImage.h"
-#include "Standard.h"
-#include "ToleranceSet.h"
+#include "host/domain/CheckListItem.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/CheckPointCouple.h"
+#include "host/domain/MeasurementConfiguration.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Standard.h"
+#include "host/domain/ToleranceSet.h"
 
 #include <algorithm>
 #include <utility>

@@ -1,6 +1,6 @@
-#include "RGBValue.h"
+#include "host/domain/RGBValue.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
-#include "SchematicImage.h"
+#include "host/domain/SchematicImage.h"
 
-#include "Header.h"
-#include "ObjectCodec.h"
+#include "host/domain/Header.h"
+#include "host/domain/ObjectCodec.h"
 
 #include <utility>
 

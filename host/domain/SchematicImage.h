@@ -1,7 +1,7 @@
 #pragma once
 
-#include "BaseObject.h"
-#include "SharedBytes.h"
+#include "host/domain/BaseObject.h"
+#include "host/domain/SharedBytes.h"
 
 namespace vemi {
 

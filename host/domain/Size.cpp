@@ -1,6 +1,6 @@
-#include "Size.h"
+#include "host/domain/Size.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

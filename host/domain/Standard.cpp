@@ -1,8 +1,8 @@
-#include "Standard.h"
+#include "host/domain/Standard.h"
 
-#include "AppearanceValues.h"
-#include "ObjectCodec.h"
-#include "RGBValue.h"
+#include "host/domain/AppearanceValues.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/RGBValue.h"
 
 namespace vemi {
 

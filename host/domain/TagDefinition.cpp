@@ -1,6 +1,6 @@
-#include "TagDefinition.h"
+#include "host/domain/TagDefinition.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
-#include "TagValue.h"
+#include "host/domain/TagValue.h"
 
-#include "ObjectCodec.h"
-#include "TagDefinition.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/TagDefinition.h"
 
 #include <utility>
 

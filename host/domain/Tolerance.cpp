@@ -1,6 +1,6 @@
-#include "Tolerance.h"
+#include "host/domain/Tolerance.h"
 
-#include "ObjectCodec.h"
+#include "host/domain/ObjectCodec.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
-#include "ToleranceSet.h"
+#include "host/domain/ToleranceSet.h"
 
-#include "ObjectCodec.h"
-#include "Tolerance.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/domain/Tolerance.h"
 
 namespace vemi {
 

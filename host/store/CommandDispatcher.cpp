@@ -1,4 +1,4 @@
-#include "CommandDispatcher.h"
+#include "host/store/CommandDispatcher.h"
 
 namespace vemi {
 

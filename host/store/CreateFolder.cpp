@@ -1,8 +1,8 @@
-#include "CreateFolder.h"
+#include "host/store/CreateFolder.h"
 
-#include "DirectoryQueries.h"
-#include "FolderResponse.h"
-#include "StoreDatabase.h"
+#include "host/store/DirectoryQueries.h"
+#include "host/store/FolderResponse.h"
+#include "host/store/StoreDatabase.h"
 
 #include <QUuid>
 

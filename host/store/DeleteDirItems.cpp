@@ -1,7 +1,7 @@
-#include "DeleteDirItems.h"
+#include "host/store/DeleteDirItems.h"
 
-#include "Response.h"
-#include "StoreDatabase.h"
+#include "host/store/Response.h"
+#include "host/store/StoreDatabase.h"
 
 namespace vemi {
 

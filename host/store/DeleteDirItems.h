@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Command.h"
+#include "host/store/Command.h"
 
 #include <vector>
 

@@ -1,7 +1,7 @@
-#include "DirectoryQueries.h"
+#include "host/store/DirectoryQueries.h"
 
-#include "StoreDatabase.h"
-#include "StoreError.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "DirFolder.h"
-#include "Response.h"
+#include "host/store/DirFolder.h"
+#include "host/store/Response.h"
 
 #include <memory>
 #include <vector>

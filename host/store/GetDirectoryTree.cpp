@@ -1,9 +1,9 @@
-#include "GetDirectoryTree.h"
+#include "host/store/GetDirectoryTree.h"
 
-#include "DirEntry.h"
-#include "DirectoryTreeResponse.h"
-#include "Header.h"
-#include "StoreDatabase.h"
+#include "host/domain/DirEntry.h"
+#include "host/store/DirectoryTreeResponse.h"
+#include "host/domain/Header.h"
+#include "host/store/StoreDatabase.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
-#include "GetMarloObject.h"
+#include "host/store/GetMarloObject.h"
 
-#include "GetMarloObjectResponse.h"
-#include "StoredObjectReader.h"
+#include "host/store/GetMarloObjectResponse.h"
+#include "host/store/StoredObjectReader.h"
 
 namespace vemi {
 

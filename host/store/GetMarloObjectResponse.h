@@ -1,6 +1,6 @@
 #pragma once
 
-#include "Response.h"
+#include "host/store/Response.h"
 
 #include <memory>
 

@@ -1,8 +1,8 @@
-#include "GetMarloObjects.h"
+#include "host/store/GetMarloObjects.h"
 
-#include "BaseObject.h"
-#include "GetMarloObjectsResponse.h"
-#include "StoredObjectReader.h"
+#include "host/domain/BaseObject.h"
+#include "host/store/GetMarloObjectsResponse.h"
+#include "host/store/StoredObjectReader.h"
 
 namespace vemi {
 

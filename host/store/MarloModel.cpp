@@ -1,6 +1,6 @@
-#include "MarloModel.h"
+#include "host/store/MarloModel.h"
 
-#include "StoreDispatcher.h"
+#include "host/store/StoreDispatcher.h"
 
 #include <QDir>
 #include <QFileInfo>

@@ -1,9 +1,9 @@
-#include "MoveDirItem.h"
+#include "host/store/MoveDirItem.h"
 
-#include "DirectoryQueries.h"
-#include "Response.h"
-#include "StoreDatabase.h"
-#include "StoreError.h"
+#include "host/store/DirectoryQueries.h"
+#include "host/store/Response.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Command.h"
-#include "DirFolder.h"
+#include "host/store/Command.h"
+#include "host/store/DirFolder.h"
 
 namespace vemi {
 

@@ -1,9 +1,9 @@
-#include "QtCommand.h"
+#include "host/store/QtCommand.h"
 
-#include "Command.h"
-#include "ErrorInfo.h"
-#include "Progress.h"
-#include "Response.h"
+#include "host/store/Command.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/Progress.h"
+#include "host/store/Response.h"
 
 namespace vemi {
 

@@ -1,12 +1,12 @@
-#include "RenameDirItem.h"
+#include "host/store/RenameDirItem.h"
 
-#include "BaseObject.h"
-#include "DirectoryQueries.h"
-#include "Header.h"
-#include "ObjectCodec.h"
-#include "Response.h"
-#include "StoreDatabase.h"
-#include "StoreError.h"
+#include "host/domain/BaseObject.h"
+#include "host/store/DirectoryQueries.h"
+#include "host/domain/Header.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/store/Response.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
 
 namespace vemi {
 

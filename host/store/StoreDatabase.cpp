@@ -1,6 +1,6 @@
-#include "StoreDatabase.h"
+#include "host/store/StoreDatabase.h"
 
-#include "StoreError.h"
+#include "host/store/StoreError.h"
 
 #include <QSqlDatabase>
 #include <QSqlError>

@@ -1,8 +1,8 @@
-#include "StoreDispatcher.h"
+#include "host/store/StoreDispatcher.h"
 
-#include "Command.h"
-#include "QtCommand.h"
-#include "StoreWorker.h"
+#include "host/store/Command.h"
+#include "host/store/QtCommand.h"
+#include "host/store/StoreWorker.h"
 
 namespace vemi {
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "CommandDispatcher.h"
-#include "StoreOptions.h"
+#include "host/store/CommandDispatcher.h"
+#include "host/store/StoreOptions.h"
 
 #include <QString>
 #include <QThread>

@@ -1,12 +1,12 @@
-#include "StoreWorker.h"
+#include "host/store/StoreWorker.h"
 
-#include "Command.h"
-#include "DecodeError.h"
-#include "ErrorInfo.h"
-#include "QtCommand.h"
-#include "Response.h"
-#include "StoreDatabase.h"
-#include "StoreError.h"
+#include "host/store/Command.h"
+#include "host/domain/DecodeError.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/QtCommand.h"
+#include "host/store/Response.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
 
 namespace vemi {
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "StoreOptions.h"
+#include "host/store/StoreOptions.h"
 
 #include <QObject>
 #include <QString>

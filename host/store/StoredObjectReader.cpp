@@ -1,10 +1,10 @@
-#include "StoredObjectReader.h"
+#include "host/store/StoredObjectReader.h"
 
-#include "BaseObject.h"
-#include "DecodeError.h"
-#include "ObjectCodec.h"
-#include "StoreDatabase.h"
-#include "StoreError.h"
+#include "host/domain/BaseObject.h"
+#include "host/domain/DecodeError.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
 
 namespace vemi {
 

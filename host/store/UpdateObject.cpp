@@ -1,13 +1,13 @@
-#include "UpdateObject.h"
+#include "host/store/UpdateObject.h"
 
-#include "BaseObject.h"
-#include "DirEntry.h"
-#include "DirectoryQueries.h"
-#include "Header.h"
-#include "ObjectCodec.h"
-#include "StoreDatabase.h"
-#include "StoreError.h"
-#include "UpdateObjectResponse.h"
+#include "host/domain/BaseObject.h"
+#include "host/domain/DirEntry.h"
+#include "host/store/DirectoryQueries.h"
+#include "host/domain/Header.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/store/StoreDatabase.h"
+#include "host/store/StoreError.h"
+#include "host/store/UpdateObjectResponse.h"
 
 #include <QUuid>
 

@@ -1,7 +1,7 @@
 #pragma once
 
-#include "Command.h"
-#include "ObjectSnapshot.h"
+#include "host/store/Command.h"
+#include "host/domain/ObjectSnapshot.h"
 
 #include <optional>
 

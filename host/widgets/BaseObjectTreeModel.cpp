@@ -1,6 +1,6 @@
-#include "BaseObjectTreeModel.h"
+#include "host/widgets/BaseObjectTreeModel.h"
 
-#include "NamedObject.h"
+#include "host/domain/NamedObject.h"
 
 #include <QFont>
 #include <QIcon>
@@ -236,3 +236,16 @@ QIcon BaseObjectTreeModel::iconFor(const Node*) const
 }
 
 } // namespace vemi
+
+namespace {
+
+// Registered when the host library is loaded, so that a browser's selection
+// can travel through queued connections.
+void registerTreeModelMetaTypes()
+{
+    qRegisterMetaType<QVector<vemi::BaseObjectTreeModel::Node*>>("QVector<vemi::BaseObjectTreeModel::Node*>");
+}
+
+} // namespace
+
+Q_CONSTRUCTOR_FUNCTION(registerTreeModelMetaTypes)

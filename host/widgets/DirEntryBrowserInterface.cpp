@@ -1,6 +1,6 @@
-#include "DirEntryBrowserInterface.h"
+#include "host/widgets/DirEntryBrowserInterface.h"
 
-#include "DirEntryBrowserWidget.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
 
 #include <algorithm>
 #include <vector>

@@ -1,9 +1,9 @@
-#include "DirEntryBrowserWidget.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
 
-#include "DirEntry.h"
-#include "DirEntryBrowserInterface.h"
-#include "DirEntryTreeModel.h"
-#include "NamedObject.h"
+#include "host/domain/DirEntry.h"
+#include "host/widgets/DirEntryBrowserInterface.h"
+#include "host/widgets/DirEntryTreeModel.h"
+#include "host/domain/NamedObject.h"
 
 #include <QAction>
 #include <QEventLoop>

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "BaseObjectTreeModel.h"
+#include "host/widgets/BaseObjectTreeModel.h"
 
 #include <QVector>
 #include <QWidget>

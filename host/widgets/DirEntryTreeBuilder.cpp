@@ -1,8 +1,8 @@
-#include "DirEntryTreeBuilder.h"
+#include "host/widgets/DirEntryTreeBuilder.h"
 
-#include "DirEntry.h"
-#include "DirectoryTreeResponse.h"
-#include "NamedObject.h"
+#include "host/domain/DirEntry.h"
+#include "host/store/DirectoryTreeResponse.h"
+#include "host/domain/NamedObject.h"
 
 #include <set>
 

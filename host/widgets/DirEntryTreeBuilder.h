@@ -1,6 +1,6 @@
 #pragma once
 
-#include "DirEntryTreeModel.h"
+#include "host/widgets/DirEntryTreeModel.h"
 
 #include <map>
 #include <memory>

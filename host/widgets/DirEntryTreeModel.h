@@ -1,7 +1,7 @@
 #pragma once
 
-#include "BaseObjectTreeModel.h"
-#include "DirFolder.h"
+#include "host/widgets/BaseObjectTreeModel.h"
+#include "host/store/DirFolder.h"
 
 #include <functional>
 #include <memory>

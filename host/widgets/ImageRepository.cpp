@@ -1,4 +1,4 @@
-#include "ImageRepository.h"
+#include "host/widgets/ImageRepository.h"
 
 #include <QFile>
 #include <QPixmap>

@@ -1,28 +1,29 @@
-#include "SampleData.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "app/sampledata/SampleData.h"
+#include "tests/common/TempStore.h"
 
-#include "AppearanceValues.h"
-#include "CheckPoint.h"
-#include "CheckPointCouple.h"
-#include "ColorStandardsLibrary.h"
-#include "CreateFolder.h"
-#include "DirEntry.h"
-#include "DirectoryTreeResponse.h"
-#include "GetDirectoryTree.h"
-#include "GetMarloObjects.h"
-#include "GetMarloObjectsResponse.h"
-#include "LabValue.h"
-#include "MeasurementConfiguration.h"
-#include "Position.h"
-#include "PropertyLibrary.h"
-#include "QCJobTemplate.h"
-#include "RGBValue.h"
-#include "SchematicImage.h"
-#include "Size.h"
-#include "Standard.h"
-#include "TagDefinition.h"
-#include "TagValue.h"
-#include "ToleranceSet.h"
+#include "host/domain/AppearanceValues.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/CheckPointCouple.h"
+#include "host/domain/ColorStandardsLibrary.h"
+#include "host/store/CreateFolder.h"
+#include "host/domain/DirEntry.h"
+#include "host/store/DirectoryTreeResponse.h"
+#include "host/store/GetDirectoryTree.h"
+#include "host/store/GetMarloObjects.h"
+#include "host/store/GetMarloObjectsResponse.h"
+#include "host/domain/LabValue.h"
+#include "host/domain/MeasurementConfiguration.h"
+#include "host/domain/Position.h"
+#include "host/domain/PropertyLibrary.h"
+#include "host/domain/QCJobTemplate.h"
+#include "host/domain/RGBValue.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Size.h"
+#include "host/domain/Standard.h"
+#include "host/domain/TagDefinition.h"
+#include "host/domain/TagValue.h"
+#include "host/domain/ToleranceSet.h"
 
 #include <QImage>
 #include <QtTest>
@@ -340,6 +341,6 @@ void tst_SampleData::failureReportsStoreMessage()
     QCOMPARE(itemCount(store), 0);
 }
 
-QTEST_MAIN(tst_SampleData)
+QC_TEST_MAIN(tst_SampleData)
 
 #include "tst_sampledata.moc"

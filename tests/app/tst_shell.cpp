@@ -1,7 +1,8 @@
-#include "PluginCatalog.h"
-#include "ShellOptions.h"
+#include "tests/common/TestMain.h"
+#include "app/PluginCatalog.h"
+#include "app/ShellOptions.h"
 
-#include "ClientInterface.h"
+#include "host/client/ClientInterface.h"
 
 #include <QFile>
 #include <QProcess>
@@ -123,5 +124,5 @@ void tst_Shell::otherStoresLiveBesideTheDefault()
     QCOMPARE(refused.contains(id), file.isEmpty() && id != QLatin1String("Local"));
 }
 
-QTEST_MAIN(tst_Shell)
+QC_TEST_MAIN(tst_Shell)
 #include "tst_shell.moc"

@@ -1,8 +1,8 @@
-#include "CheckListText.h"
+#include "tests/common/CheckListText.h"
 
-#include "CheckPoint.h"
-#include "CheckPointCouple.h"
-#include "QCJobTemplate.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/CheckPointCouple.h"
+#include "host/domain/QCJobTemplate.h"
 
 #include <QStringList>
 

@@ -1,4 +1,4 @@
-#include "RawConnection.h"
+#include "tests/common/RawConnection.h"
 
 #include <QSqlDatabase>
 #include <QSqlQuery>

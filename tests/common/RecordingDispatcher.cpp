@@ -1,6 +1,6 @@
-#include "RecordingDispatcher.h"
+#include "tests/common/RecordingDispatcher.h"
 
-#include "QtCommand.h"
+#include "host/store/QtCommand.h"
 
 RecordingDispatcher::RecordingDispatcher()
     : vemi::CommandDispatcher("recording")

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "CommandDispatcher.h"
+#include "host/store/CommandDispatcher.h"
 
 #include <functional>
 #include <memory>

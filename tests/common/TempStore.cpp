@@ -1,12 +1,12 @@
-#include "TempStore.h"
+#include "tests/common/TempStore.h"
 
-#include "BaseObject.h"
-#include "CommandDispatcher.h"
-#include "ErrorInfo.h"
-#include "GetMarloObject.h"
-#include "GetMarloObjectResponse.h"
-#include "QtCommand.h"
-#include "UpdateObject.h"
+#include "host/domain/BaseObject.h"
+#include "host/store/CommandDispatcher.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/GetMarloObject.h"
+#include "host/store/GetMarloObjectResponse.h"
+#include "host/store/QtCommand.h"
+#include "host/store/UpdateObject.h"
 
 #include <QEventLoop>
 #include <QTimer>

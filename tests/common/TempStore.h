@@ -1,6 +1,6 @@
 #pragma once
 
-#include "MarloModel.h"
+#include "host/store/MarloModel.h"
 
 #include <QTemporaryDir>
 

@@ -1,16 +1,17 @@
-#include "ModalAnswer.h"
-#include "RawConnection.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/ModalAnswer.h"
+#include "tests/common/RawConnection.h"
+#include "tests/common/TempStore.h"
 
-#include "CreateFolder.h"
-#include "DeleteDirItems.h"
-#include "DirEntry.h"
-#include "DirEntryBrowserInterface.h"
-#include "DirEntryBrowserWidget.h"
-#include "DirEntryTreeModel.h"
-#include "FolderResponse.h"
-#include "Header.h"
-#include "QCJobTemplate.h"
+#include "host/store/CreateFolder.h"
+#include "host/store/DeleteDirItems.h"
+#include "host/domain/DirEntry.h"
+#include "host/widgets/DirEntryBrowserInterface.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
+#include "host/widgets/DirEntryTreeModel.h"
+#include "host/store/FolderResponse.h"
+#include "host/domain/Header.h"
+#include "host/domain/QCJobTemplate.h"
 
 #include <QAction>
 #include <QTreeView>
@@ -343,5 +344,5 @@ void tst_DirEntryBrowser::damagedObjectIsLeftOutOfTheSelection()
     QVERIFY(browser.widget.findChild<QMessageBox*>()->text().contains(QStringLiteral("damaged")));
 }
 
-QTEST_MAIN(tst_DirEntryBrowser)
+QC_TEST_MAIN(tst_DirEntryBrowser)
 #include "tst_direntrybrowser.moc"

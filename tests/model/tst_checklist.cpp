@@ -1,13 +1,14 @@
-#include "CheckListText.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/CheckListText.h"
+#include "tests/common/TempStore.h"
 
-#include "CheckPoint.h"
-#include "CheckPointCouple.h"
-#include "Position.h"
-#include "QCJobTemplate.h"
-#include "QCJobTemplateModel.h"
-#include "SchematicImage.h"
-#include "Size.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/CheckPointCouple.h"
+#include "host/domain/Position.h"
+#include "host/domain/QCJobTemplate.h"
+#include "model/QCJobTemplateModel.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Size.h"
 
 #include <QtTest>
 
@@ -269,5 +270,5 @@ void tst_CheckList::swappingMembersReplacesTheCouple()
     QCOMPARE(after->name(), std::string("A"));
 }
 
-QTEST_MAIN(tst_CheckList)
+QC_TEST_MAIN(tst_CheckList)
 #include "tst_checklist.moc"

@@ -1,21 +1,22 @@
-#include "CheckListText.h"
-#include "RecordingDispatcher.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/CheckListText.h"
+#include "tests/common/RecordingDispatcher.h"
+#include "tests/common/TempStore.h"
 
-#include "CheckPoint.h"
-#include "ColorStandardsLibrary.h"
-#include "GetMarloObjects.h"
-#include "MeasurementConfiguration.h"
-#include "Position.h"
-#include "QCJobTemplate.h"
-#include "QCJobTemplateModel.h"
-#include "SchematicImage.h"
-#include "Size.h"
-#include "Standard.h"
-#include "TagDefinition.h"
-#include "TagValue.h"
-#include "ToleranceSet.h"
-#include "UpdateObject.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/ColorStandardsLibrary.h"
+#include "host/store/GetMarloObjects.h"
+#include "host/domain/MeasurementConfiguration.h"
+#include "host/domain/Position.h"
+#include "host/domain/QCJobTemplate.h"
+#include "model/QCJobTemplateModel.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Size.h"
+#include "host/domain/Standard.h"
+#include "host/domain/TagDefinition.h"
+#include "host/domain/TagValue.h"
+#include "host/domain/ToleranceSet.h"
+#include "host/store/UpdateObject.h"
 
 #include <QtTest>
 
@@ -280,5 +281,5 @@ void tst_QCJobTemplateModel::editedTemplateSurvivesTheStore()
     QCOMPARE(stored->schematicImage()->name(), std::string("part.rev.JPG"));
 }
 
-QTEST_MAIN(tst_QCJobTemplateModel)
+QC_TEST_MAIN(tst_QCJobTemplateModel)
 #include "tst_qcjobtemplatemodel.moc"

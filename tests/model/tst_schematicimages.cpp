@@ -1,13 +1,14 @@
-#include "RecordingDispatcher.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/RecordingDispatcher.h"
+#include "tests/common/TempStore.h"
 
-#include "CheckPoint.h"
-#include "Position.h"
-#include "QCJobTemplate.h"
-#include "QCJobTemplateModel.h"
-#include "SchematicImage.h"
-#include "Size.h"
-#include "UpdateObject.h"
+#include "host/domain/CheckPoint.h"
+#include "host/domain/Position.h"
+#include "host/domain/QCJobTemplate.h"
+#include "model/QCJobTemplateModel.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Size.h"
+#include "host/store/UpdateObject.h"
 
 #include <QtTest>
 
@@ -234,5 +235,5 @@ void tst_SchematicImages::emptyAreaChangesNothing()
     QCOMPARE(savable.count(), 0);
 }
 
-QTEST_MAIN(tst_SchematicImages)
+QC_TEST_MAIN(tst_SchematicImages)
 #include "tst_schematicimages.moc"

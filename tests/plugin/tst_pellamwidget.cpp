@@ -1,16 +1,17 @@
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/TempStore.h"
 
-#include "DirEntryBrowserWidget.h"
-#include "DirEntryTreeModel.h"
-#include "PellamSettings.h"
-#include "PellamSettingsKeys.h"
-#include "PellamWidget.h"
-#include "QCJobTemplate.h"
-#include "QCJobTemplateDetailWidget.h"
-#include "QCJobTemplateModel.h"
-#include "SchematicImage.h"
-#include "SettingsManager.h"
-#include "Standard.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
+#include "host/widgets/DirEntryTreeModel.h"
+#include "plugin/PellamSettings.h"
+#include "plugin/PellamSettingsKeys.h"
+#include "plugin/PellamWidget.h"
+#include "host/domain/QCJobTemplate.h"
+#include "detail/QCJobTemplateDetailWidget.h"
+#include "model/QCJobTemplateModel.h"
+#include "host/domain/SchematicImage.h"
+#include "host/client/SettingsManager.h"
+#include "host/domain/Standard.h"
 
 #include <QAction>
 #include <QLabel>
@@ -216,5 +217,5 @@ void tst_PellamWidget::settingsObjectIsCommonSettings()
     QVERIFY(!settings.isExpertOnly());
 }
 
-QTEST_MAIN(tst_PellamWidget)
+QC_TEST_MAIN(tst_PellamWidget)
 #include "tst_pellamwidget.moc"

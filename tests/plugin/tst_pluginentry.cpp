@@ -1,14 +1,15 @@
-#include "ModalAnswer.h"
-#include "RecordingDispatcher.h"
-#include "TempStore.h"
+#include "tests/common/TestMain.h"
+#include "tests/common/ModalAnswer.h"
+#include "tests/common/RecordingDispatcher.h"
+#include "tests/common/TempStore.h"
 
-#include "AppWidget.h"
-#include "ClientInterface.h"
-#include "CommonSettings.h"
-#include "CorvoTopBar.h"
-#include "GetDirectoryTree.h"
-#include "ImageRepository.h"
-#include "Version.h"
+#include "host/client/AppWidget.h"
+#include "host/client/ClientInterface.h"
+#include "host/client/CommonSettings.h"
+#include "host/client/CorvoTopBar.h"
+#include "host/store/GetDirectoryTree.h"
+#include "host/widgets/ImageRepository.h"
+#include "host/client/Version.h"
 
 #include <QAction>
 #include <QMenu>
@@ -45,7 +46,7 @@ private:
 void tst_PluginEntry::initTestCase()
 {
     QSettings().clear();
-    const QDir folder(qEnvironmentVariable("QCEDITOR_PLUGIN_DIR"));
+    const QDir folder(QStringLiteral(PLUGIN_DIR));
     const QStringList files = folder.entryList({QStringLiteral("*pellam*")}, QDir::Files);
     QCOMPARE(files.size(), 1);
     m_pluginPath = folder.filePath(files.first());
@@ -172,5 +173,5 @@ void tst_PluginEntry::mayCloseIsTheBrowsersAnswer()
     QVERIFY(tab->mayClose());
 }
 
-QTEST_MAIN(tst_PluginEntry)
+QC_TEST_MAIN(tst_PluginEntry)
 #include "tst_pluginentry.moc"

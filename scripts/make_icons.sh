@@ -5,14 +5,14 @@
 # 8x oversized and box-filtered down, so edges come out anti-aliased and the
 # output is the same on every run. Re-run after editing a drawing:
 #
-#     host/resources/make_icons.sh
+#     scripts/make_icons.sh
 #
 # Needs ImageMagick's convert (set CONVERT to use another binary).
 set -euo pipefail
 
 CONVERT=${CONVERT:-convert}
-HERE=$(cd "$(dirname "${BASH_SOURCE[0]}")" && pwd)
-ROOT=$(cd "$HERE/../.." && pwd)
+ROOT=$(cd "$(dirname "${BASH_SOURCE[0]}")/.." && pwd)
+HERE="$ROOT/host/resources"
 SS=8                      # oversampling factor
 
 # Palette

@@ -1,4 +1,4 @@
-#include "LabToScreen.h"
+#include "app/sampledata/LabToScreen.h"
 
 #include <lcms2.h>
 

@@ -1,6 +1,6 @@
 #pragma once
 
-#include "SampleColours.h"
+#include "app/sampledata/SampleColours.h"
 
 #include <array>
 #include <memory>

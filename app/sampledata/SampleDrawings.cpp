@@ -1,4 +1,4 @@
-#include "SampleDrawings.h"
+#include "app/sampledata/SampleDrawings.h"
 
 #include <QPainter>
 #include <QPainterPath>
