@@ -1,6 +1,7 @@
 #include "host/widgets/BaseObjectTreeModel.h"
 
 #include "host/domain/NamedObject.h"
+#include "host/widgets/NameOrder.h"
 
 #include <QFont>
 #include <QIcon>
@@ -62,7 +63,7 @@ bool BaseObjectTreeModel::sortsBefore(const Node* a, const Node* b)
 {
     if (a->isFolder() != b->isFolder())
         return a->isFolder();
-    return QString::localeAwareCompare(a->displayName(), b->displayName()) < 0;
+    return NameOrder::standard().lessThan(a->displayName(), b->displayName());
 }
 
 int BaseObjectTreeModel::insertPosition(const Node* parent, const Node* node) const
