@@ -3,14 +3,13 @@
 #include "host/domain/CheckPoint.h"
 #include "host/domain/CheckPointCouple.h"
 #include "host/domain/ColorStandardsLibrary.h"
-#include "host/store/CommandDispatcher.h"
+#include "host/store/CommandSender.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObjects.h"
 #include "host/domain/Header.h"
 #include "host/store/MarloModel.h"
 #include "host/domain/Position.h"
 #include "host/domain/QCJobTemplate.h"
-#include "host/store/QtCommand.h"
 #include "host/domain/SchematicImage.h"
 #include "host/domain/Size.h"
 #include "host/domain/TagDefinition.h"
@@ -54,14 +53,14 @@ QCJobTemplateModel::~QCJobTemplateModel() = default;
 void QCJobTemplateModel::runCommand(std::shared_ptr<vemi::Command> command, ResponseHandler onResponse,
                                     ErrorHandler onError)
 {
-    const auto dispatcher = m_store.commandDispatcher("");
-    if (!dispatcher)
-        return;
-    auto wrapper = std::make_shared<vemi::QtCommand>(std::move(command));
-    connect(wrapper.get(), &vemi::QtCommand::responseReceived, this, onResponse);
+    vemi::CommandSender::OnError errorHandler;
     if (onError)
-        connect(wrapper.get(), &vemi::QtCommand::errorReceived, this, onError);
-    dispatcher->dispatch(wrapper);
+        errorHandler = [this, onError](const std::shared_ptr<vemi::ErrorInfo>& error) { (this->*onError)(error); };
+    vemi::CommandSender::send(m_store, std::string(), std::move(command), this,
+                              [this, onResponse](const std::shared_ptr<vemi::Response>& response) {
+                                  (this->*onResponse)(response);
+                              },
+                              errorHandler);
 }
 
 void QCJobTemplateModel::setJobTemplate(std::shared_ptr<vemi::QCJobTemplate> jobTemplate)

@@ -1,27 +1,20 @@
 #include "app/sampledata/SampleData.h"
 
-#include "host/domain/ColorStandardsLibrary.h"
-#include "host/store/CommandDispatcher.h"
-#include "host/store/CreateFolder.h"
-#include "host/store/DirectoryTreeResponse.h"
-#include "host/store/ErrorInfo.h"
-#include "host/store/FolderResponse.h"
-#include "host/store/GetDirectoryTree.h"
 #include "app/sampledata/LabToScreen.h"
-#include "host/store/MarloModel.h"
+#include "app/sampledata/SampleCatalogue.h"
+#include "host/domain/ColorStandardsLibrary.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/PropertyLibrary.h"
 #include "host/domain/QCJobTemplate.h"
-#include "host/store/QtCommand.h"
-#include "app/sampledata/SampleCatalogue.h"
 #include "host/domain/Standard.h"
 #include "host/domain/TagDefinition.h"
 #include "host/domain/ToleranceSet.h"
-#include "host/store/UpdateObject.h"
-#include "host/store/UpdateObjectResponse.h"
-
-#include <QEventLoop>
-#include <QTimer>
+#include "host/store/CommandSender.h"
+#include "host/store/DirectoryTreeResponse.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/FillEmptyStore.h"
+#include "host/store/FillEmptyStoreResponse.h"
+#include "host/store/GetDirectoryTree.h"
 
 namespace vemi {
 
@@ -33,128 +26,66 @@ constexpr int kAnswerTimeoutMs = 30000;
 const char* const kSamplesFolder = "Samples";
 const char* const kTemplatesFolder = "Sample Job Templates";
 
-struct SeedFailure
+// Files objects of one type in a top-level folder of their own.
+template <class Objects>
+void addAll(FillEmptyStore& set, const std::string& objectType, const char* folderName, const Objects& objects)
 {
-    QString message;
-};
-
-struct Answer
-{
-    std::shared_ptr<Response> response;
-    QString error;
-};
-
-Answer runAndWait(CommandDispatcher& dispatcher, std::shared_ptr<Command> command)
-{
-    auto wrapper = std::make_shared<QtCommand>(std::move(command));
-    Answer answer;
-    QEventLoop loop;
-    QObject::connect(wrapper.get(), &QtCommand::responseReceived, &loop, [&](std::shared_ptr<Response> response) {
-        answer.response = std::move(response);
-        loop.quit();
-    });
-    QObject::connect(wrapper.get(), &QtCommand::errorReceived, &loop, [&](std::shared_ptr<ErrorInfo> error) {
-        answer.error = error ? error->message() : QStringLiteral("The object store failed without saying why.");
-        loop.quit();
-    });
-    QTimer::singleShot(kAnswerTimeoutMs, &loop, [&] {
-        answer.error = QStringLiteral("The object store did not answer while the sample data was stored.");
-        loop.quit();
-    });
-    dispatcher.dispatch(wrapper);
-    loop.exec();
-    return answer;
+    const std::string folderId = set.addFolder(objectType, std::string(), folderName);
+    for (const auto& object : objects)
+        set.addObject(object, folderId);
 }
 
-class Seeder
+template <class Object>
+void addOne(FillEmptyStore& set, const char* folderName, const std::shared_ptr<Object>& object)
 {
-public:
-    explicit Seeder(CommandDispatcher& dispatcher) : m_dispatcher(dispatcher) {}
-
-    bool templateTreeIsEmpty()
-    {
-        auto tree = run<DirectoryTreeResponse>(std::make_shared<GetDirectoryTree>(QCJobTemplate::typeId()));
-        return tree->folders().empty() && tree->entries().empty();
-    }
-
-    void seed()
-    {
-        const auto toScreen = LabToScreen::create();
-        if (!toScreen)
-            throw SeedFailure{QStringLiteral("Cannot compute the display colours of the sample standards: "
-                                             "Little CMS could not create the Lab to sRGB transform.")};
-        const SampleCatalogue::Samples samples = SampleCatalogue::samples(*toScreen);
-
-        storeAll(samples.standards, topFolder(Standard::typeId(), kSamplesFolder));
-        store(SampleCatalogue::standardsLibrary(samples), topFolder(ColorStandardsLibrary::typeId(), kSamplesFolder));
-        storeAll(samples.tagDefinitions, topFolder(TagDefinition::typeId(), kSamplesFolder));
-        store(SampleCatalogue::propertyLibrary(samples), topFolder(PropertyLibrary::typeId(), kSamplesFolder));
-        store(samples.toleranceSet, topFolder(ToleranceSet::typeId(), kSamplesFolder));
-        store(samples.configuration, topFolder(MeasurementConfiguration::typeId(), kSamplesFolder));
-
-        // Templates last: a template tree that is not empty means seeding is done.
-        storeAll(SampleCatalogue::jobTemplates(samples), topFolder(QCJobTemplate::typeId(), kTemplatesFolder));
-    }
-
-private:
-    template <class R>
-    std::shared_ptr<R> run(std::shared_ptr<Command> command)
-    {
-        const std::string description = command->description();
-        Answer answer = runAndWait(m_dispatcher, std::move(command));
-        if (!answer.error.isEmpty())
-            throw SeedFailure{answer.error};
-        auto response = std::dynamic_pointer_cast<R>(answer.response);
-        if (!response)
-            throw SeedFailure{QStringLiteral("Cannot %1: the object store gave an unexpected answer.")
-                                  .arg(QString::fromStdString(description))};
-        return response;
-    }
-
-    // The top-level folder of that name, created when it is missing: other
-    // trees than the template tree may already hold a folder of it.
-    std::string topFolder(const std::string& objectType, const std::string& name)
-    {
-        auto tree = run<DirectoryTreeResponse>(std::make_shared<GetDirectoryTree>(objectType));
-        for (const DirFolder& folder : tree->folders()) {
-            if (folder.parentId.empty() && folder.name == name)
-                return folder.id;
-        }
-        return run<FolderResponse>(std::make_shared<CreateFolder>(objectType, std::string(), name))->folder().id;
-    }
-
-    void store(const std::shared_ptr<BaseObject>& object, const std::string& folderId)
-    {
-        auto command = std::make_shared<UpdateObject>();
-        command->setObject(object);
-        command->setFolderId(folderId);
-        run<UpdateObjectResponse>(command);
-    }
-
-    template <class Objects>
-    void storeAll(const Objects& objects, const std::string& folderId)
-    {
-        for (const auto& object : objects)
-            store(object, folderId);
-    }
-
-    CommandDispatcher& m_dispatcher;
-};
+    addAll(set, Object::typeId(), folderName, std::vector<std::shared_ptr<Object>>{object});
+}
 
 } // namespace
 
+std::shared_ptr<FillEmptyStore> SampleData::buildSet(QString* error)
+{
+    const auto toScreen = LabToScreen::create();
+    if (!toScreen) {
+        *error = QStringLiteral("Cannot compute the display colours of the sample standards: "
+                                "Little CMS could not create the Lab to sRGB transform.");
+        return nullptr;
+    }
+    const SampleCatalogue::Samples samples = SampleCatalogue::samples(*toScreen);
+
+    auto set = std::make_shared<FillEmptyStore>("store the sample data");
+    addAll(*set, Standard::typeId(), kSamplesFolder, samples.standards);
+    addOne(*set, kSamplesFolder, SampleCatalogue::standardsLibrary(samples));
+    addAll(*set, TagDefinition::typeId(), kSamplesFolder, samples.tagDefinitions);
+    addOne(*set, kSamplesFolder, SampleCatalogue::propertyLibrary(samples));
+    addOne(*set, kSamplesFolder, samples.toleranceSet);
+    addOne(*set, kSamplesFolder, samples.configuration);
+    addAll(*set, QCJobTemplate::typeId(), kTemplatesFolder, SampleCatalogue::jobTemplates(samples));
+    return set;
+}
+
 QString SampleData::seedIfEmpty(MarloModel& store)
 {
-    auto dispatcher = store.commandDispatcher("");
-    if (!dispatcher)
-        return QStringLiteral("Cannot store the sample data: there is no default object store.");
-    try {
-        Seeder seeder(*dispatcher);
-        if (seeder.templateTreeIsEmpty())
-            seeder.seed();
-    } catch (const SeedFailure& failure) {
-        return failure.message;
-    }
+    // Building the set takes a while (pictures, colour transforms). A store
+    // whose template tree holds anything is not empty, which one quick read
+    // tells; any other store gets the set, and the store decides.
+    const CommandSender::Answer tree = CommandSender::sendAndWait(
+        store, std::string(), std::make_shared<GetDirectoryTree>(QCJobTemplate::typeId()), kAnswerTimeoutMs);
+    if (tree.error)
+        return tree.error->message();
+    const auto templates = std::dynamic_pointer_cast<DirectoryTreeResponse>(tree.response);
+    if (templates && !(templates->folders().empty() && templates->entries().empty()))
+        return {};
+
+    QString error;
+    auto set = buildSet(&error);
+    if (!set)
+        return error;
+    const CommandSender::Answer answer = CommandSender::sendAndWait(store, std::string(), set, kAnswerTimeoutMs);
+    if (answer.error)
+        return answer.error->message();
+    if (!std::dynamic_pointer_cast<FillEmptyStoreResponse>(answer.response))
+        return QStringLiteral("Cannot store the sample data: the object store gave an unexpected answer.");
     return {};
 }
 

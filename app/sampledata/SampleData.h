@@ -2,8 +2,11 @@
 
 #include <QString>
 
+#include <memory>
+
 namespace vemi {
 
+class FillEmptyStore;
 class MarloModel;
 
 // The objects a new user finds on first start: colour standards and their
@@ -12,11 +15,16 @@ class MarloModel;
 class SampleData
 {
 public:
-    // Fills the default store when its job template tree holds neither folders
-    // nor entries; otherwise leaves the store as it is. Runs the commands one
-    // by one and waits for each answer in a local event loop, so call it at
-    // start-up only. Returns the store's error message, empty on success.
+    // Stores the whole sample set in one transaction when the default store
+    // holds no folder and no object; otherwise leaves the store as it is, also
+    // when another program fills it at the same moment. Waits for the store's
+    // answer, so call it at start-up only. Returns the error message, empty on
+    // success and when nothing needed writing.
     static QString seedIfEmpty(MarloModel& store);
+
+    // The sample set as one command, built in memory. Null, with error set,
+    // when the display colours of the standards cannot be computed.
+    static std::shared_ptr<FillEmptyStore> buildSet(QString* error);
 };
 
 } // namespace vemi

@@ -35,6 +35,15 @@ void DirectoryQueries::requireFreeFolderName(const std::string& objectType, cons
         throw StoreError("a folder named \"" + name + "\" already exists there");
 }
 
+void DirectoryQueries::insertFolder(const DirFolder& folder)
+{
+    requireFolder(folder.parentId, folder.objectType);
+    requireFreeFolderName(folder.objectType, folder.parentId, folder.name, std::string());
+    m_database.run(QStringLiteral("INSERT INTO folders(id, object_type, parent_id, name) VALUES(?, ?, ?, ?)"),
+                   {QString::fromStdString(folder.id), QString::fromStdString(folder.objectType),
+                    folderValue(folder.parentId), QString::fromStdString(folder.name)});
+}
+
 bool DirectoryQueries::isInSubtree(const std::string& folderId, const std::string& rootId)
 {
     return m_database.scalar(

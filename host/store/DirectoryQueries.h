@@ -1,5 +1,7 @@
 #pragma once
 
+#include "host/store/DirFolder.h"
+
 #include <QVariant>
 
 #include <string>
@@ -23,6 +25,9 @@ public:
     // Throws StoreError when a sibling folder already has the name.
     void requireFreeFolderName(const std::string& objectType, const std::string& parentId,
                                const std::string& name, const std::string& exceptId);
+    // Inserts the folder after checking its parent and its name; runs inside
+    // the caller's transaction.
+    void insertFolder(const DirFolder& folder);
     bool isInSubtree(const std::string& folderId, const std::string& rootId);
 
 private:

@@ -25,20 +25,26 @@ void UpdateObject::prepare()
 
 std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
 {
+    const QByteArray data = encode();
+    std::shared_ptr<DirEntry> entry;
+    database.writeTransaction([&] { entry = write(database, data); });
+    return std::make_shared<UpdateObjectResponse>(m_id, entry);
+}
+
+QByteArray UpdateObject::encode() const
+{
     if (!m_snapshot)
         throw StoreError("there is no object to save");
-    const QByteArray data = m_snapshot->toCbor();
-    std::shared_ptr<DirEntry> entry;
-    database.writeTransaction([&] {
-        database.run(QStringLiteral("INSERT INTO objects(id, type, name, data) VALUES(?, ?, ?, ?)"
-                                    " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
-                                    " name = excluded.name, data = excluded.data"),
-                     {QString::fromStdString(m_id), QString::fromStdString(m_type),
-                      QString::fromStdString(m_name), data});
-        if (m_folderId)
-            entry = fileInFolder(database);
-    });
-    return std::make_shared<UpdateObjectResponse>(m_id, entry);
+    return m_snapshot->toCbor();
+}
+
+std::shared_ptr<DirEntry> UpdateObject::write(StoreDatabase& database, const QByteArray& data)
+{
+    database.run(QStringLiteral("INSERT INTO objects(id, type, name, data) VALUES(?, ?, ?, ?)"
+                                " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
+                                " name = excluded.name, data = excluded.data"),
+                 {QString::fromStdString(m_id), QString::fromStdString(m_type), QString::fromStdString(m_name), data});
+    return m_folderId ? fileInFolder(database) : nullptr;
 }
 
 std::shared_ptr<DirEntry> UpdateObject::fileInFolder(StoreDatabase& database)

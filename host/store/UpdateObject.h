@@ -3,6 +3,8 @@
 #include "host/store/Command.h"
 #include "host/domain/ObjectSnapshot.h"
 
+#include <QByteArray>
+
 #include <optional>
 
 namespace vemi {
@@ -25,6 +27,12 @@ public:
     void prepare() override;
     std::shared_ptr<Response> execute(StoreDatabase& database) override;
     std::string description() const override;
+
+    // For a command that writes several objects in one transaction: encode
+    // each first (on the worker, outside the transaction), then write each
+    // inside the caller's transaction. write() returns the folder entry, if any.
+    QByteArray encode() const;
+    std::shared_ptr<DirEntry> write(StoreDatabase& database, const QByteArray& data);
 
 private:
     std::shared_ptr<DirEntry> fileInFolder(StoreDatabase& database);

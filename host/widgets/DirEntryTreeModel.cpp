@@ -1,22 +1,20 @@
 #include "host/widgets/DirEntryTreeModel.h"
 
-#include "host/store/CommandDispatcher.h"
+#include "host/store/CommandSender.h"
 #include "host/store/CreateFolder.h"
 #include "host/store/DeleteDirItems.h"
 #include "host/domain/DirEntry.h"
 #include "host/widgets/DirEntryTreeBuilder.h"
 #include "host/store/DirectoryTreeResponse.h"
+#include "host/store/EntryObjectFetch.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/FolderResponse.h"
 #include "host/store/GetDirectoryTree.h"
-#include "host/store/GetMarloObject.h"
-#include "host/store/GetMarloObjectResponse.h"
 #include "host/domain/Header.h"
 #include "host/widgets/ImageRepository.h"
 #include "host/store/MarloModel.h"
 #include "host/store/MoveDirItem.h"
 #include "host/domain/NamedObject.h"
-#include "host/store/QtCommand.h"
 #include "host/store/RenameDirItem.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
@@ -45,25 +43,22 @@ DirEntryTreeModel::DirEntryTreeModel(MarloModel& store, QObject* parent)
 
 void DirEntryTreeModel::run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done)
 {
-    const auto dispatcher = m_store.commandDispatcher(m_dispatcherId);
-    if (!dispatcher) {
-        emit sgErrorOccurred(tr("There is no store named \"%1\".").arg(QString::fromStdString(m_dispatcherId)));
-        if (done)
-            done(false);
-        return;
-    }
-    auto wrapper = std::make_shared<QtCommand>(std::move(command));
-    connect(wrapper.get(), &QtCommand::responseReceived, this, [onResponse, done](std::shared_ptr<Response> response) {
-        onResponse(response);
-        if (done)
-            done(true);
-    });
-    connect(wrapper.get(), &QtCommand::errorReceived, this, [this, done](std::shared_ptr<ErrorInfo> error) {
+    CommandSender::send(m_store, m_dispatcherId, std::move(command), this,
+                        [onResponse, done](const std::shared_ptr<Response>& response) {
+                            onResponse(response);
+                            if (done)
+                                done(true);
+                        },
+                        failure(done));
+}
+
+std::function<void(const std::shared_ptr<ErrorInfo>&)> DirEntryTreeModel::failure(const Done& done)
+{
+    return [this, done](const std::shared_ptr<ErrorInfo>& error) {
         emit sgErrorOccurred(error->message());
         if (done)
             done(false);
-    });
-    dispatcher->dispatch(wrapper);
+    };
 }
 
 std::string DirEntryTreeModel::folderIdOf(const Node* folder)
@@ -123,18 +118,19 @@ DirEntryTreeModel::DirEntryNode* DirEntryTreeModel::addUnsavedObject(Node* folde
 
 void DirEntryTreeModel::loadObject(DirEntryNode* node, const Done& done)
 {
-    auto command = std::make_shared<GetMarloObject>();
-    command->setType(node->dirEntry()->entryObjectType());
-    command->setId(node->dirEntry()->entryObjectId());
     const quint64 serial = node->serial();
-    run(command, [this, serial](const std::shared_ptr<Response>& response) {
-        const auto answer = std::dynamic_pointer_cast<GetMarloObjectResponse>(response);
-        auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
-        if (!answer || !target || target->object())
-            return; // gone, or loaded (and maybe edited) meanwhile
-        target->setObject(std::dynamic_pointer_cast<NamedObject>(answer->object()));
-        nodeChanged(target);
-    }, done);
+    EntryObjectFetch::fetch(m_store, *node->dirEntry(), m_dispatcherId, this,
+                            [this, serial, done](const std::shared_ptr<BaseObject>& object) {
+                                auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+                                // Unless gone, or loaded (and maybe edited) meanwhile.
+                                if (target && !target->object()) {
+                                    target->setObject(std::dynamic_pointer_cast<NamedObject>(object));
+                                    nodeChanged(target);
+                                }
+                                if (done)
+                                    done(true);
+                            },
+                            failure(done));
 }
 
 void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)

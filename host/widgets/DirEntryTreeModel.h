@@ -11,6 +11,7 @@ namespace vemi {
 
 class Command;
 class DirEntry;
+class ErrorInfo;
 class MarloModel;
 class Response;
 
@@ -75,6 +76,8 @@ public:
     std::vector<std::string> pathOf(const Node* node) const;
 
     DirEntryNode* addUnsavedObject(Node* folder, std::shared_ptr<NamedObject> object);
+    // Fetches from the store the entry names (EntryObjectFetch), which for a
+    // GlobalDirEntry may be another than the model's own.
     void loadObject(DirEntryNode* node, const Done& done);
     void saveObject(DirEntryNode* node, const Done& done);
     void createFolder(Node* parentFolder, const std::string& name, const Done& done);
@@ -91,7 +94,9 @@ protected:
 
 private:
     using OnResponse = std::function<void(const std::shared_ptr<Response>&)>;
+    // Sends to the model's own store; a failure goes to sgErrorOccurred and done(false).
     void run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done);
+    std::function<void(const std::shared_ptr<ErrorInfo>&)> failure(const Done& done);
     static std::string folderIdOf(const Node* folder);
     void applyRename(quint64 serial, const std::string& name);
     void undoRename(quint64 serial, const std::string& name, const std::string& oldName);

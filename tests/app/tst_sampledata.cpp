@@ -1,14 +1,19 @@
 #include "tests/common/TestMain.h"
 #include "app/sampledata/SampleData.h"
+#include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
 
 #include "host/domain/AppearanceValues.h"
 #include "host/domain/CheckPoint.h"
 #include "host/domain/CheckPointCouple.h"
 #include "host/domain/ColorStandardsLibrary.h"
+#include "host/store/CommandSender.h"
 #include "host/store/CreateFolder.h"
 #include "host/domain/DirEntry.h"
 #include "host/store/DirectoryTreeResponse.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/FillEmptyStore.h"
+#include "host/store/FillEmptyStoreResponse.h"
 #include "host/store/GetDirectoryTree.h"
 #include "host/store/GetMarloObjects.h"
 #include "host/store/GetMarloObjectsResponse.h"
@@ -34,11 +39,6 @@ using namespace vemi;
 
 namespace {
 
-const std::vector<std::string> kSampleTypes = {
-    QCJobTemplate::typeId(),   Standard::typeId(),     ColorStandardsLibrary::typeId(),
-    TagDefinition::typeId(),   PropertyLibrary::typeId(), ToleranceSet::typeId(),
-    MeasurementConfiguration::typeId()};
-
 std::shared_ptr<DirectoryTreeResponse> tree(TempStore& store, const std::string& type)
 {
     return std::dynamic_pointer_cast<DirectoryTreeResponse>(store.run(std::make_shared<GetDirectoryTree>(type)).response);
@@ -58,17 +58,37 @@ std::vector<std::shared_ptr<T>> fetchAll(TempStore& store, int depth = 1)
     return objects;
 }
 
-// Folders plus entries over every tree the sample data writes to; -1 when a tree cannot be read.
-int itemCount(TempStore& store)
+// Rows of the store's tables, read behind the store's back: also objects that no entry files.
+struct Rows
 {
-    int count = 0;
-    for (const std::string& type : kSampleTypes) {
-        auto response = tree(store, type);
-        if (!response)
-            return -1;
-        count += int(response->folders().size() + response->entries().size());
+    int folders = -1;
+    int objects = -1;
+    int entries = -1;
+    bool operator==(const Rows& other) const
+    {
+        return folders == other.folders && objects == other.objects && entries == other.entries;
     }
-    return count;
+};
+
+Rows rowsOf(const QString& path)
+{
+    RawConnection raw(path);
+    return {raw.scalar("SELECT count(*) FROM folders").toInt(), raw.scalar("SELECT count(*) FROM objects").toInt(),
+            raw.scalar("SELECT count(*) FROM dir_entries").toInt()};
+}
+
+QString describe(const Rows& rows)
+{
+    return QStringLiteral("%1 folders, %2 objects, %3 entries").arg(rows.folders).arg(rows.objects).arg(rows.entries);
+}
+
+std::shared_ptr<FillEmptyStore> sampleSet()
+{
+    QString error;
+    auto set = SampleData::buildSet(&error);
+    if (!set)
+        qWarning("%s", qPrintable(error));
+    return set;
 }
 
 QImage decode(const std::shared_ptr<SchematicImage>& image)
@@ -98,9 +118,12 @@ private slots:
     void displayColoursFollowLab_data();
     void displayColoursFollowLab();
     void secondRunAddsNothing();
-    void storeWithTemplateTreeIsLeftAlone_data();
-    void storeWithTemplateTreeIsLeftAlone();
-    void failureReportsStoreMessage();
+    void storeWithAnythingIsLeftAlone_data();
+    void storeWithAnythingIsLeftAlone();
+    void shellsSeedingAtOnceWriteOneSet_data();
+    void shellsSeedingAtOnceWriteOneSet();
+    void failureHalfWayLeavesStoreEmpty_data();
+    void failureHalfWayLeavesStoreEmpty();
 
 private:
     std::unique_ptr<TempStore> m_seeded;
@@ -297,48 +320,127 @@ void tst_SampleData::displayColoursFollowLab()
 
 void tst_SampleData::secondRunAddsNothing()
 {
-    const int before = itemCount(*m_seeded);
-    QVERIFY(before > 0);
+    const Rows before = rowsOf(m_seeded->path());
+    QVERIFY(before.objects > 0);
     QCOMPARE(SampleData::seedIfEmpty(m_seeded->model()), QString());
-    QCOMPARE(itemCount(*m_seeded), before);
+    QVERIFY2(rowsOf(m_seeded->path()) == before, qPrintable(describe(rowsOf(m_seeded->path()))));
 }
 
-void tst_SampleData::storeWithTemplateTreeIsLeftAlone_data()
+void tst_SampleData::storeWithAnythingIsLeftAlone_data()
 {
-    QTest::addColumn<bool>("folderOnly");
-    QTest::newRow("a template at the top level") << false;
-    QTest::newRow("only an empty template folder") << true;
+    QTest::addColumn<QString>("content");
+    QTest::newRow("a template at the top level") << "template";
+    QTest::newRow("only an empty template folder") << "template folder";
+    QTest::newRow("only a folder in another tree") << "standards folder";
+    QTest::newRow("only an object that no folder files") << "unfiled standard";
 }
 
-void tst_SampleData::storeWithTemplateTreeIsLeftAlone()
+void tst_SampleData::storeWithAnythingIsLeftAlone()
 {
-    QFETCH(bool, folderOnly);
+    QFETCH(QString, content);
 
     TempStore store;
-    if (folderOnly) {
-        QVERIFY(store.run(std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", "Mine")).response);
-    } else {
+    if (content == "template folder" || content == "standards folder") {
+        const std::string type = content == "template folder" ? QCJobTemplate::typeId() : Standard::typeId();
+        QVERIFY(store.run(std::make_shared<CreateFolder>(type, "", "Mine")).response);
+    } else if (content == "template") {
         auto jobTemplate = std::make_shared<QCJobTemplate>();
         jobTemplate->setName("Bumper");
         const std::string topLevel;
         QVERIFY(store.save(jobTemplate, &topLevel));
+    } else {
+        auto standard = std::make_shared<Standard>();
+        standard->setName("Loose");
+        QVERIFY(store.save(standard));
     }
-    QCOMPARE(itemCount(store), 1);
+    const Rows before = rowsOf(store.path());
 
     QCOMPARE(SampleData::seedIfEmpty(store.model()), QString());
-    QCOMPARE(itemCount(store), 1);
+    QVERIFY2(rowsOf(store.path()) == before, qPrintable(describe(rowsOf(store.path()))));
 }
 
-void tst_SampleData::failureReportsStoreMessage()
+// Two shells started together on a new store: each has its own connection
+// (and worker), and the second sends while the first one's set is in flight.
+void tst_SampleData::shellsSeedingAtOnceWriteOneSet_data()
 {
-    TempStore store;
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
+    QTest::addColumn<bool>("twoShells");
+    QTest::newRow("two shells on one new store file") << true;
+    QTest::newRow("one shell sending the set twice") << false;
+}
 
-    const QString message = SampleData::seedIfEmpty(store.model());
-    QVERIFY2(message.contains("read-only"), qPrintable(message));
-    QCOMPARE(itemCount(store), 0);
+void tst_SampleData::shellsSeedingAtOnceWriteOneSet()
+{
+    QFETCH(bool, twoShells);
+
+    TempStore store;
+    MarloModel otherShell(store.path());
+    QCOMPARE(otherShell.open(), QString());
+    MarloModel& second = twoShells ? otherShell : store.model();
+
+    const auto first = sampleSet();
+    const auto again = sampleSet();
+    QVERIFY(first && again);
+    QObject context;
+    int answers = 0;
+    int written = 0;
+    QStringList errors;
+    const auto onResponse = [&](const std::shared_ptr<Response>& response) {
+        ++answers;
+        const auto filled = std::dynamic_pointer_cast<FillEmptyStoreResponse>(response);
+        written += filled && filled->written();
+    };
+    const auto onError = [&](const std::shared_ptr<ErrorInfo>& error) {
+        ++answers;
+        errors << error->message();
+    };
+    CommandSender::send(store.model(), "", first, &context, onResponse, onError);
+    CommandSender::send(second, "", again, &context, onResponse, onError);
+    QTRY_COMPARE_WITH_TIMEOUT(answers, 2, 30000);
+    QVERIFY2(errors.isEmpty(), qPrintable(errors.join('\n')));
+    QCOMPARE(written, 1);
+    QVERIFY2(rowsOf(store.path()) == rowsOf(m_seeded->path()), qPrintable(describe(rowsOf(store.path()))));
+}
+
+void tst_SampleData::failureHalfWayLeavesStoreEmpty_data()
+{
+    QTest::addColumn<QString>("failure");
+    QTest::addColumn<QString>("messagePart");
+    QTest::newRow("read-only store") << "read-only" << "read-only";
+    QTest::newRow("a folder name twice, after the first folders") << "folder twice" << "already exists";
+    QTest::newRow("an object filed in no folder of the set, after all the others")
+        << "missing folder" << "no longer exists";
+}
+
+void tst_SampleData::failureHalfWayLeavesStoreEmpty()
+{
+    QFETCH(QString, failure);
+    QFETCH(QString, messagePart);
+
+    TempStore store;
+    QString message;
+    if (failure == "read-only") {
+        StoreOptions readOnly;
+        readOnly.readOnly = true;
+        store.reopen(readOnly);
+        message = SampleData::seedIfEmpty(store.model());
+    } else {
+        const auto set = sampleSet();
+        QVERIFY(set);
+        if (failure == "folder twice") {
+            set->addFolder(Standard::typeId(), "", "Samples");
+        } else {
+            auto standard = std::make_shared<Standard>();
+            standard->setName("Stray");
+            set->addObject(standard, "a folder nobody created");
+        }
+        const TempStore::Answer answer = store.run(set);
+        QVERIFY(!answer.response);
+        QVERIFY(answer.error);
+        message = answer.error->message();
+    }
+    QVERIFY2(message.contains(messagePart) && message.contains("sample data"), qPrintable(message));
+    const Rows rows = rowsOf(store.path());
+    QVERIFY2(rows == (Rows{0, 0, 0}), qPrintable(describe(rows)));
 }
 
 QC_TEST_MAIN(tst_SampleData)

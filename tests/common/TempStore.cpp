@@ -1,15 +1,10 @@
 #include "tests/common/TempStore.h"
 
 #include "host/domain/BaseObject.h"
-#include "host/store/CommandDispatcher.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObject.h"
 #include "host/store/GetMarloObjectResponse.h"
-#include "host/store/QtCommand.h"
 #include "host/store/UpdateObject.h"
-
-#include <QEventLoop>
-#include <QTimer>
 
 #include <cstdio>
 
@@ -30,19 +25,9 @@ void TempStore::reopen(vemi::StoreOptions options)
         std::fprintf(stderr, "TempStore: %s\n", qPrintable(error));
 }
 
-TempStore::Answer TempStore::run(std::shared_ptr<vemi::Command> command)
+TempStore::Answer TempStore::run(std::shared_ptr<vemi::Command> command, const std::string& dispatcherId)
 {
-    Answer answer;
-    QEventLoop loop;
-    auto wrapper = std::make_shared<vemi::QtCommand>(std::move(command));
-    QObject::connect(wrapper.get(), &vemi::QtCommand::responseReceived, &loop,
-                     [&](std::shared_ptr<vemi::Response> response) { answer.response = response; loop.quit(); });
-    QObject::connect(wrapper.get(), &vemi::QtCommand::errorReceived, &loop,
-                     [&](std::shared_ptr<vemi::ErrorInfo> error) { answer.error = error; loop.quit(); });
-    QTimer::singleShot(20000, &loop, [&]() { answer.timedOut = true; loop.quit(); });
-    m_model->commandDispatcher("")->dispatch(wrapper);
-    loop.exec();
-    return answer;
+    return vemi::CommandSender::sendAndWait(*m_model, dispatcherId, std::move(command), 20000);
 }
 
 std::shared_ptr<vemi::Response> TempStore::save(std::shared_ptr<vemi::BaseObject> object, const std::string* folderId)

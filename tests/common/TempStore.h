@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/store/CommandSender.h"
 #include "host/store/MarloModel.h"
 
 #include <QTemporaryDir>
@@ -10,7 +11,6 @@
 namespace vemi {
 class BaseObject;
 class Command;
-class ErrorInfo;
 class Response;
 } // namespace vemi
 
@@ -19,12 +19,7 @@ class Response;
 class TempStore
 {
 public:
-    struct Answer
-    {
-        std::shared_ptr<vemi::Response> response;
-        std::shared_ptr<vemi::ErrorInfo> error;
-        bool timedOut = false;
-    };
+    using Answer = vemi::CommandSender::Answer;
 
     explicit TempStore(vemi::StoreOptions options = {});
     ~TempStore();
@@ -35,7 +30,8 @@ public:
     // Closes the store (its worker finishes first) and opens the same file anew.
     void reopen(vemi::StoreOptions options = {});
 
-    Answer run(std::shared_ptr<vemi::Command> command);
+    // Waits at most 20 s; dispatcherId "" is the default store.
+    Answer run(std::shared_ptr<vemi::Command> command, const std::string& dispatcherId = std::string());
     // Both return null (and print the error) when the store refuses.
     std::shared_ptr<vemi::Response> save(std::shared_ptr<vemi::BaseObject> object, const std::string* folderId = nullptr);
     std::shared_ptr<vemi::BaseObject> fetch(const std::string& type, const std::string& id, int depth = 1);
