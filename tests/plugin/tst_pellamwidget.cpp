@@ -3,7 +3,6 @@
 
 #include "host/widgets/DirEntryBrowserWidget.h"
 #include "host/widgets/DirEntryTreeModel.h"
-#include "plugin/PellamSettings.h"
 #include "plugin/PellamSettingsKeys.h"
 #include "plugin/PellamWidget.h"
 #include "host/domain/QCJobTemplate.h"
@@ -53,7 +52,6 @@ private slots:
     void selectionDecidesPageAndTemplate();
     void newTemplateIsNamedAndBecomesModelsTemplate();
     void editorModificationReachesBrowser();
-    void settingsObjectIsCommonSettings();
 
 private:
     PellamWidget* createWidget();
@@ -204,17 +202,6 @@ void tst_PellamWidget::editorModificationReachesBrowser()
     emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
     QVERIFY(node->isModified());
     QVERIFY(browser->actionSave()->isEnabled());
-}
-
-void tst_PellamWidget::settingsObjectIsCommonSettings()
-{
-    PellamSettings settings(QStringLiteral("QC Job Template Editor"));
-    QCOMPARE(settings.qt_metacast("vemi::PellamSettings"), static_cast<void*>(&settings));
-    QCOMPARE(settings.qt_metacast("CommonSettings"), static_cast<void*>(static_cast<CommonSettings*>(&settings)));
-    QCOMPARE(settings.settingsName(), std::string("QC Job Template Editor"));
-    QCOMPARE(settings.title(), settings.settingsName());
-    QVERIFY(settings.isUserVisible());
-    QVERIFY(!settings.isExpertOnly());
 }
 
 QC_TEST_MAIN(tst_PellamWidget)
