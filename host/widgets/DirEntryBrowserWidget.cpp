@@ -116,7 +116,6 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
 void DirEntryBrowserWidget::createCustomMenus(QMenu* menu, const QString& singular, const QString& plural,
                                               bool withFolderActions)
 {
-    m_singular = singular;
     m_plural = plural;
     m_actionOpen->setText(tr("Open %1…").arg(singular));
     m_actionSave->setText(tr("Save %1").arg(singular));

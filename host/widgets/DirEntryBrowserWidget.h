@@ -116,7 +116,6 @@ private:
     QAction* m_actionRename = nullptr;
     QAction* m_actionMove = nullptr;
     QAction* m_actionDelete = nullptr;
-    QString m_singular;
     QString m_plural;
     quint64 m_selectionGeneration = 0;
     quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
