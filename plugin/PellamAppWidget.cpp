@@ -30,6 +30,8 @@ void PellamAppWidget::createContent()
 
 void PellamAppWidget::addMenus(CorvoTopBar* topBar)
 {
+    if (!m_browser)
+        return;
     auto* menu = new QMenu(tr("File"));
     m_browser->createCustomMenus(menu);
     menu->addSeparator();
@@ -41,17 +43,19 @@ void PellamAppWidget::addMenus(CorvoTopBar* topBar)
 
 void PellamAppWidget::addToolBarActions(QWidget* bar)
 {
-    m_browser->addBrowserActions(bar);
+    if (m_browser)
+        m_browser->addBrowserActions(bar);
 }
 
 bool PellamAppWidget::mayClose()
 {
-    return m_browser->mayClose();
+    return !m_browser || m_browser->mayClose();
 }
 
 void PellamAppWidget::refresh()
 {
-    m_browser->refresh();
+    if (m_browser)
+        m_browser->refresh();
 }
 
 } // namespace vemi

@@ -12,7 +12,9 @@ class PellamSettings;
 class PellamWidget;
 
 // The client's tab: holds the job template browser and gives the host its
-// "File" menu and its new, open and save tool bar actions.
+// "File" menu and its new, open and save tool bar actions. Before
+// createContent() has made the browser, the entry points do nothing and
+// mayClose() answers true.
 class PellamAppWidget : public AppWidget
 {
     Q_OBJECT

@@ -14,7 +14,9 @@ class BaseSetting;
 class CorvoTopBar;
 
 // The content of a client's tab. The host calls createContent() once after
-// construction, then addMenus() and addToolBarActions().
+// construction, then addMenus() and addToolBarActions(). A host may call any
+// entry point before createContent(): until the content exists each does
+// nothing (mayClose() answers true), and subclasses keep it so.
 class AppWidget : public QWidget, public SupportedInstruments
 {
     Q_OBJECT

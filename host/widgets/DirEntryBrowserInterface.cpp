@@ -1,33 +1,26 @@
 #include "host/widgets/DirEntryBrowserInterface.h"
 
-#include "host/widgets/DirEntryBrowserWidget.h"
+#include "host/widgets/FirstFreeName.h"
+#include "host/widgets/FolderNames.h"
+#include "host/widgets/ObjectTypeNames.h"
 
-#include <algorithm>
 #include <vector>
 
 namespace vemi {
 
 DirEntryBrowserInterface::~DirEntryBrowserInterface()
 {
-    if (m_browserWidget)
-        m_browserWidget->m_callbacks = nullptr;
+    if (m_folderBrowser)
+        m_folderBrowser->clientDestroyed(this);
 }
 
 std::string DirEntryBrowserInterface::defaultNamedObjectName(QString base)
 {
-    const std::vector<std::string> taken = m_browserWidget ? m_browserWidget->namesInNewObjectFolder()
+    if (base.isEmpty())
+        base = ObjectTypeNames::singular(namedObjectTypeId());
+    const std::vector<std::string> taken = m_folderBrowser ? m_folderBrowser->namesInTargetFolder()
                                                            : std::vector<std::string>();
-    const std::string first = base.toStdString();
-    const auto isFree = [&taken](const std::string& name) {
-        return std::find(taken.begin(), taken.end(), name) == taken.end();
-    };
-    if (isFree(first))
-        return first;
-    for (int number = 2;; ++number) {
-        const std::string candidate = first + " " + std::to_string(number);
-        if (isFree(candidate))
-            return candidate;
-    }
+    return firstFreeName(base.toStdString(), taken);
 }
 
 } // namespace vemi

@@ -3,6 +3,8 @@
 #include "host/domain/DirEntry.h"
 #include "host/widgets/DirEntryBrowserInterface.h"
 #include "host/widgets/DirEntryTreeModel.h"
+#include "host/widgets/FolderCommands.h"
+#include "host/widgets/ObjectTypeNames.h"
 #include "host/domain/NamedObject.h"
 
 #include <QAction>
@@ -13,7 +15,6 @@
 #include <QMenu>
 #include <QMessageBox>
 #include <QPointer>
-#include <QSettings>
 #include <QTreeView>
 #include <QVBoxLayout>
 
@@ -25,7 +26,8 @@ using Node = BaseObjectTreeModel::Node;
 using DirEntryNode = DirEntryTreeModel::DirEntryNode;
 
 DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
-    : QWidget(parent), m_title(new QLabel(this)), m_tree(new QTreeView(this))
+    : QWidget(parent), m_title(new QLabel(this)), m_tree(new QTreeView(this)),
+      m_folderCommands(new FolderCommands(this))
 {
     QFont titleFont = m_title->font();
     titleFont.setBold(true);
@@ -33,6 +35,7 @@ DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
     m_tree->setHeaderHidden(true);
     m_tree->setContextMenuPolicy(Qt::CustomContextMenu);
     connect(m_tree, &QWidget::customContextMenuRequested, this, &DirEntryBrowserWidget::showContextMenu);
+    connect(m_folderCommands, &FolderCommands::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
 
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(4, 4, 4, 4);
@@ -43,8 +46,14 @@ DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
 
 DirEntryBrowserWidget::~DirEntryBrowserWidget()
 {
-    if (m_callbacks)
-        m_callbacks->m_browserWidget = nullptr;
+    if (m_callbacks && m_callbacks->folderBrowser() == this)
+        m_callbacks->setFolderBrowser(nullptr);
+}
+
+void DirEntryBrowserWidget::clientDestroyed(DirEntryBrowserInterface* client)
+{
+    if (m_callbacks == client)
+        m_callbacks = nullptr;
 }
 
 void DirEntryBrowserWidget::createActions()
@@ -76,14 +85,14 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
                                        bool singleSelection)
 {
     m_model = model;
+    m_folderCommands->setModel(model);
     m_callbacks = callbacks;
     if (m_callbacks)
-        m_callbacks->m_browserWidget = this;
+        m_callbacks->setFolderBrowser(this);
     m_plural = title;
     m_title->setText(title);
     m_actionNew->setText(newText);
-    m_settingsKey = QStringLiteral("Browser/%1/%2/lastSelection")
-                        .arg(QString::fromStdString(settingsName), QString::fromStdString(typeId));
+    m_selectionMemory.setKey(settingsName, typeId);
 
     m_model->setObjectType(typeId);
     m_tree->setModel(m_model);
@@ -95,7 +104,7 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
             &DirEntryBrowserWidget::onTreeSelectionChanged);
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
 
-    const std::string remembered = QSettings().value(m_settingsKey).toString().toStdString();
+    const std::string remembered = m_selectionMemory.remembered();
     m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this), remembered](bool ok) {
         if (!self || !ok)
             return;
@@ -107,7 +116,6 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
 void DirEntryBrowserWidget::createCustomMenus(QMenu* menu, const QString& singular, const QString& plural,
                                               bool withFolderActions)
 {
-    m_singular = singular;
     m_plural = plural;
     m_actionOpen->setText(tr("Open %1…").arg(singular));
     m_actionSave->setText(tr("Save %1").arg(singular));
@@ -191,32 +199,17 @@ void DirEntryBrowserWidget::emitSelection(quint64 generation)
     emit sgSelectionChanged(nodes);
 }
 
-std::string DirEntryBrowserWidget::keyOf(const Node* node) const
-{
-    if (const auto* folder = dynamic_cast<const DirEntryTreeModel::FolderNode*>(node))
-        return "folder:" + folder->folder().id;
-    const auto* entry = dynamic_cast<const DirEntryNode*>(node);
-    if (entry && entry->isSaved())
-        return "entry:" + entry->dirEntry()->id();
-    if (entry && entry->object())
-        return "object:" + entry->object()->id();
-    return {};
-}
-
 std::vector<std::string> DirEntryBrowserWidget::selectionKeys() const
 {
     std::vector<std::string> keys;
     for (Node* node : selectedNodes())
-        keys.push_back(keyOf(node));
+        keys.push_back(SelectionMemory::keyOf(node));
     return keys;
 }
 
 void DirEntryBrowserWidget::rememberSelection()
 {
-    Node* node = currentNode();
-    const auto* entry = dynamic_cast<const DirEntryNode*>(node);
-    if (entry && entry->isSaved())
-        QSettings().setValue(m_settingsKey, QString::fromStdString(keyOf(entry)));
+    m_selectionMemory.remember(currentNode());
 }
 
 void DirEntryBrowserWidget::restoreSelection(const std::vector<std::string>& keys)
@@ -224,7 +217,7 @@ void DirEntryBrowserWidget::restoreSelection(const std::vector<std::string>& key
     QItemSelection selection;
     QModelIndex current;
     for (Node* node : m_model->descendants(m_model->root())) {
-        if (std::find(keys.begin(), keys.end(), keyOf(node)) == keys.end())
+        if (std::find(keys.begin(), keys.end(), SelectionMemory::keyOf(node)) == keys.end())
             continue;
         const QModelIndex index = m_model->indexFromNode(node);
         for (QModelIndex parent = index.parent(); parent.isValid(); parent = parent.parent())
@@ -276,8 +269,10 @@ void DirEntryBrowserWidget::namedObjectWasModified(std::shared_ptr<NamedObject> 
     updateActions();
 }
 
-std::vector<std::string> DirEntryBrowserWidget::namesInNewObjectFolder() const
+std::vector<std::string> DirEntryBrowserWidget::namesInTargetFolder() const
 {
+    if (!m_model)
+        return {};
     const Node* folder = m_newObjectFolder ? m_model->findBySerial(m_newObjectFolder) : nullptr;
     return m_model->namesIn(folder);
 }
@@ -294,52 +289,24 @@ void DirEntryBrowserWidget::createNewObject()
     selectNode(m_model->addUnsavedObject(folder, object));
 }
 
-// Dialogs below run their own event loop, in which answers from the store may
-// rebuild or shrink the tree: they hold serials across the dialog, not nodes.
-
-std::vector<quint64> DirEntryBrowserWidget::serialsOf(const std::vector<Node*>& nodes)
-{
-    std::vector<quint64> serials;
-    for (const Node* node : nodes)
-        serials.push_back(node ? node->serial() : 0);
-    return serials;
-}
-
-std::vector<Node*> DirEntryBrowserWidget::liveNodes(const std::vector<quint64>& serials) const
-{
-    std::vector<Node*> nodes;
-    for (quint64 serial : serials) {
-        if (Node* node = m_model->findBySerial(serial))
-            nodes.push_back(node);
-    }
-    return nodes;
-}
-
-QString DirEntryBrowserWidget::pathText(const Node* node) const
-{
-    QStringList path;
-    for (const std::string& folder : m_model->pathOf(node))
-        path << QString::fromStdString(folder);
-    if (!node->isFolder())
-        path << node->displayName();
-    return path.join(QLatin1Char('/'));
-}
-
 void DirEntryBrowserWidget::openObject()
 {
+    if (!m_model)
+        return;
+    // The dialog runs its own event loop, in which answers from the store may
+    // rebuild the tree: hold serials across it, not nodes.
     QStringList names;
-    std::vector<Node*> candidates;
+    std::vector<quint64> serials;
     for (Node* node : m_model->descendants(m_model->root())) {
         if (!node->isFolder()) {
-            names << pathText(node);
-            candidates.push_back(node);
+            names << m_folderCommands->pathText(node);
+            serials.push_back(node->serial());
         }
     }
-    if (candidates.empty()) {
+    if (serials.empty()) {
         showError(tr("There is nothing to open yet."));
         return;
     }
-    const std::vector<quint64> serials = serialsOf(candidates);
     bool ok = false;
     const QString chosen = QInputDialog::getItem(this, m_actionOpen->text(), m_plural, names, 0, false, &ok);
     if (!ok || !names.contains(chosen))
@@ -407,19 +374,29 @@ bool DirEntryBrowserWidget::mayClose()
         return true;
     QStringList names;
     for (const Node* node : unsaved)
-        names << QStringLiteral("  • ") + node->displayName();
-    const QString label = unsaved.size() == 1 ? (m_singular.isEmpty() ? tr("object") : m_singular)
-                                              : (m_plural.isEmpty() ? tr("objects") : m_plural);
-    const auto answer = QMessageBox::question(
-        this, tr("Unsaved changes"),
-        tr("These %1 have unsaved changes. Save them before closing?\n\n%2")
-            .arg(label, names.join(QLatin1Char('\n'))),
-        QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, QMessageBox::Save);
+        names << node->displayName();
+    const auto answer = QMessageBox::question(this, tr("Unsaved changes"),
+                                              unsavedChangesQuestion(m_model->objectType(), names),
+                                              QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel,
+                                              QMessageBox::Save);
     if (answer == QMessageBox::Discard)
         return true;
     if (answer != QMessageBox::Save)
         return false;
     return saveAndWait(unsavedNodes());
+}
+
+QString DirEntryBrowserWidget::unsavedChangesQuestion(const std::string& typeId, const QStringList& names)
+{
+    const QString question = names.size() == 1
+        ? tr("This %1 has unsaved changes. Save it before closing?").arg(ObjectTypeNames::singular(typeId))
+        : tr("These %1 %2 have unsaved changes. Save them before closing?")
+              .arg(names.size())
+              .arg(ObjectTypeNames::plural(typeId));
+    QStringList lines;
+    for (const QString& name : names)
+        lines << QStringLiteral("  • ") + name;
+    return question + QStringLiteral("\n\n") + lines.join(QLatin1Char('\n'));
 }
 
 void DirEntryBrowserWidget::refresh()
@@ -435,82 +412,22 @@ void DirEntryBrowserWidget::refresh()
 
 void DirEntryBrowserWidget::createFolder()
 {
-    Node* parent = m_model->folderFor(currentNode());
-    const std::vector<std::string> taken = m_model->namesIn(parent);
-    QString suggestion = tr("New Folder");
-    for (int number = 2; std::find(taken.begin(), taken.end(), suggestion.toStdString()) != taken.end(); ++number)
-        suggestion = tr("New Folder %1").arg(number);
-    const quint64 parentSerial = parent ? parent->serial() : 0;
-    bool ok = false;
-    const QString name = QInputDialog::getText(this, tr("New Folder"), tr("Folder name:"), QLineEdit::Normal,
-                                               suggestion, &ok).trimmed();
-    if (!ok || name.isEmpty())
-        return;
-    Node* liveParent = parentSerial ? m_model->findBySerial(parentSerial) : nullptr;
-    if (parentSerial && !liveParent) {
-        showError(tr("The folder was deleted meanwhile."));
-        return;
-    }
-    m_model->createFolder(liveParent, name.toStdString(), {});
+    m_folderCommands->createFolder(currentNode());
 }
 
 void DirEntryBrowserWidget::renameCurrent()
 {
-    Node* node = currentNode();
-    if (!node)
-        return;
-    const quint64 serial = node->serial();
-    const QString oldName = node->displayName();
-    bool ok = false;
-    const QString name = QInputDialog::getText(this, tr("Rename"), tr("New name:"), QLineEdit::Normal, oldName, &ok)
-                             .trimmed();
-    node = m_model->findBySerial(serial);
-    if (ok && node && !name.isEmpty() && name != oldName)
-        m_model->renameNode(node, name.toStdString(), {});
+    m_folderCommands->rename(currentNode());
 }
 
 void DirEntryBrowserWidget::moveSelection()
 {
-    const QVector<Node*> selected = selectedNodes();
-    const std::vector<quint64> moving = serialsOf(std::vector<Node*>(selected.begin(), selected.end()));
-    QStringList paths{tr("(top level)")};
-    std::vector<Node*> folders{nullptr};
-    for (Node* node : m_model->descendants(m_model->root())) {
-        if (node->isFolder()) {
-            paths << pathText(node);
-            folders.push_back(node);
-        }
-    }
-    const std::vector<quint64> folderSerials = serialsOf(folders);
-    bool ok = false;
-    const QString chosen = QInputDialog::getItem(this, tr("Move To"), tr("Folder:"), paths, 0, false, &ok);
-    if (!ok || !paths.contains(chosen))
-        return;
-    const quint64 targetSerial = folderSerials[size_t(paths.indexOf(chosen))];
-    Node* target = targetSerial ? m_model->findBySerial(targetSerial) : nullptr;
-    if (targetSerial && !target) {
-        showError(tr("The folder was deleted meanwhile."));
-        return;
-    }
-    for (Node* node : liveNodes(moving))
-        m_model->moveNode(node, target, {});
+    m_folderCommands->move(selectedNodes());
 }
 
 void DirEntryBrowserWidget::deleteSelection()
 {
-    const QVector<Node*> nodes = selectedNodes();
-    if (nodes.isEmpty())
-        return;
-    const std::vector<quint64> serials = serialsOf(std::vector<Node*>(nodes.begin(), nodes.end()));
-    const QString what = nodes.size() == 1 ? QStringLiteral("\"%1\"").arg(nodes.first()->displayName())
-                                           : tr("%1 items").arg(nodes.size());
-    if (QMessageBox::question(this, tr("Delete"),
-                              tr("Delete %1 with everything in it? This cannot be undone.").arg(what))
-        != QMessageBox::Yes)
-        return;
-    const std::vector<Node*> deleting = liveNodes(serials);
-    if (!deleting.empty())
-        m_model->deleteNodes(deleting, {});
+    m_folderCommands->remove(selectedNodes());
 }
 
 } // namespace vemi

@@ -1,6 +1,8 @@
 #pragma once
 
 #include "host/widgets/BaseObjectTreeModel.h"
+#include "host/widgets/FolderNames.h"
+#include "host/widgets/SelectionMemory.h"
 
 #include <QVector>
 #include <QWidget>
@@ -19,12 +21,15 @@ namespace vemi {
 
 class DirEntryBrowserInterface;
 class DirEntryTreeModel;
+class FolderCommands;
 class NamedObject;
 
 // A folder tree of stored objects of one type with the actions to create,
 // open and save them and to manage the folders. Selecting entries loads their
 // objects; an object reported modified is marked in the tree until it is saved.
-class DirEntryBrowserWidget : public QWidget
+// The folder commands are a FolderCommands of the browser; the last selected
+// entry is kept by a SelectionMemory.
+class DirEntryBrowserWidget : public QWidget, public FolderNames
 {
     Q_OBJECT
 
@@ -55,11 +60,17 @@ public:
     // Asks Save / Discard / Cancel when objects are unsaved; true when the
     // browser may close (everything saved or the user chose to discard).
     bool mayClose();
+    // The question mayClose() asks about the objects named (one or several)
+    // of the type typeId.
+    static QString unsavedChangesQuestion(const std::string& typeId, const QStringList& names);
 
     DirEntryTreeModel* treeModel() const { return m_model; }
     QTreeView* treeView() const { return m_tree; }
+    FolderCommands* folderCommands() const { return m_folderCommands; }
+
     // Names already used in the folder that "new" files into.
-    std::vector<std::string> namesInNewObjectFolder() const;
+    std::vector<std::string> namesInTargetFolder() const override;
+    void clientDestroyed(DirEntryBrowserInterface* client) override;
 
 public slots:
     void namedObjectWasModified(std::shared_ptr<vemi::NamedObject> object);
@@ -69,14 +80,12 @@ signals:
     void sgSelectionChanged(QVector<vemi::BaseObjectTreeModel::Node*> selectedNodes);
 
 private:
-    friend class DirEntryBrowserInterface;
     void createActions();
     void onTreeSelectionChanged();
     void emitSelection(quint64 generation);
     void rememberSelection();
     void restoreSelection(const std::vector<std::string>& keys);
     std::vector<std::string> selectionKeys() const;
-    std::string keyOf(const BaseObjectTreeModel::Node* node) const;
     QVector<BaseObjectTreeModel::Node*> selectedNodes() const;
     BaseObjectTreeModel::Node* currentNode() const;
     void selectNode(BaseObjectTreeModel::Node* node);
@@ -89,9 +98,6 @@ private:
     void saveCurrentObject();
     bool saveAndWait(const std::vector<BaseObjectTreeModel::Node*>& nodes);
     std::vector<BaseObjectTreeModel::Node*> unsavedNodes() const;
-    static std::vector<quint64> serialsOf(const std::vector<BaseObjectTreeModel::Node*>& nodes);
-    std::vector<BaseObjectTreeModel::Node*> liveNodes(const std::vector<quint64>& serials) const;
-    QString pathText(const BaseObjectTreeModel::Node* node) const;
     void createFolder();
     void renameCurrent();
     void moveSelection();
@@ -101,6 +107,8 @@ private:
     DirEntryBrowserInterface* m_callbacks = nullptr;
     QLabel* m_title;
     QTreeView* m_tree;
+    FolderCommands* m_folderCommands;
+    SelectionMemory m_selectionMemory;
     QAction* m_actionNew = nullptr;
     QAction* m_actionOpen = nullptr;
     QAction* m_actionSave = nullptr;
@@ -108,9 +116,7 @@ private:
     QAction* m_actionRename = nullptr;
     QAction* m_actionMove = nullptr;
     QAction* m_actionDelete = nullptr;
-    QString m_singular;
     QString m_plural;
-    QString m_settingsKey;
     quint64 m_selectionGeneration = 0;
     quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
 };

@@ -1,12 +1,21 @@
 #include "tests/common/TestMain.h"
+#include "tests/common/TempStore.h"
 #include "app/PluginCatalog.h"
 #include "app/ShellOptions.h"
+#include "app/ShellWindow.h"
 
+#include "host/client/AppWidget.h"
 #include "host/client/ClientInterface.h"
+#include "host/client/CorvoTopBar.h"
+#include "host/widgets/DirEntryBrowserWidget.h"
 
+#include <QAction>
 #include <QFile>
+#include <QMenu>
 #include <QProcess>
+#include <QTabWidget>
 #include <QTemporaryDir>
+#include <QToolBar>
 #include <QtTest>
 
 using namespace vemi;
@@ -17,6 +26,7 @@ class tst_Shell : public QObject
 
 private slots:
     void catalogTakesOnlyClientPlugins();
+    void windowShowsTheEditorTabWithItsBars();
     void badStoreFileStopsTheShell_data();
     void badStoreFileStopsTheShell();
     void shellStartsWithTheEditorTab();
@@ -44,6 +54,33 @@ void tst_Shell::catalogTakesOnlyClientPlugins()
     QCOMPARE(catalog.messages().size(), 2);
     QVERIFY(catalog.messages().filter(QStringLiteral("libforeign.so")).first().contains(QStringLiteral("org.example.SomethingElse")));
     QVERIFY(!catalog.messages().filter(QStringLiteral("libnotaplugin.so")).isEmpty());
+}
+
+// The real window with the real plug-in, loaded from the build's plug-in folder.
+void tst_Shell::windowShowsTheEditorTabWithItsBars()
+{
+    QSettings().clear();
+    TempStore store;
+    PluginCatalog catalog;
+    catalog.load(QFileInfo(QStringLiteral(CLIENT_PLUGIN)).absolutePath());
+    QCOMPARE(catalog.clients().size(), size_t(1));
+    ShellWindow window(store.model(), catalog.clients());
+    window.resize(1200, 800);
+    window.show();
+    QVERIFY(QTest::qWaitForWindowExposed(&window));
+
+    QCOMPARE(window.tabs()->count(), 1);
+    QCOMPARE(window.tabs()->tabText(0), QStringLiteral("QC Job Template Editor"));
+    QVERIFY(!window.tabs()->tabIcon(0).isNull());
+    QCOMPARE(window.tabs()->currentWidget(), window.appWidget(0));
+    auto* browser = window.appWidget(0)->findChild<DirEntryBrowserWidget*>();
+    QVERIFY(browser);
+    QVERIFY(browser->isVisible());
+    QVERIFY(window.toolBar(0)->isVisible());
+    QCOMPARE(window.toolBar(0)->actions().size(), 3);
+    QCOMPARE(window.toolBar(0)->actions().first(), browser->actionNew());
+    QCOMPARE(window.topBar(0)->actions().size(), 1);
+    QCOMPARE(window.topBar(0)->actions().first()->menu()->title(), QStringLiteral("File"));
 }
 
 QProcess* tst_Shell::runShell(const QStringList& arguments, const QString& home)

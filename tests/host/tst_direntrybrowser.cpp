@@ -1,6 +1,7 @@
 #include "tests/common/TestMain.h"
 #include "tests/common/ModalAnswer.h"
 #include "tests/common/RawConnection.h"
+#include "tests/common/ScriptedAsker.h"
 #include "tests/common/TempStore.h"
 
 #include "host/store/CreateFolder.h"
@@ -9,11 +10,15 @@
 #include "host/widgets/DirEntryBrowserInterface.h"
 #include "host/widgets/DirEntryBrowserWidget.h"
 #include "host/widgets/DirEntryTreeModel.h"
+#include "host/widgets/FolderCommands.h"
+#include "host/widgets/FolderNames.h"
 #include "host/store/FolderResponse.h"
 #include "host/domain/Header.h"
+#include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/QCJobTemplate.h"
 
 #include <QAction>
+#include <QMenu>
 #include <QTreeView>
 #include <QtTest>
 
@@ -29,10 +34,33 @@ public:
     std::shared_ptr<NamedObject> newNamedObject() override
     {
         auto jobTemplate = std::make_shared<QCJobTemplate>();
-        jobTemplate->setName(defaultNamedObjectName(QStringLiteral("Job Template")));
+        jobTemplate->setName(defaultNamedObjectName(base));
         return jobTemplate;
     }
     std::string namedObjectTypeId() override { return QCJobTemplate::typeId(); }
+
+    QString base = QStringLiteral("Job Template");
+};
+
+// A client of any type, for naming only.
+class TypedCallbacks : public DirEntryBrowserInterface
+{
+public:
+    explicit TypedCallbacks(std::string typeId) : m_typeId(std::move(typeId)) {}
+    std::shared_ptr<NamedObject> newNamedObject() override { return nullptr; }
+    std::string namedObjectTypeId() override { return m_typeId; }
+
+private:
+    std::string m_typeId;
+};
+
+// A folder browser other than DirEntryBrowserWidget: a fixed list of names.
+class FixedFolder : public FolderNames
+{
+public:
+    std::vector<std::string> namesInTargetFolder() const override { return names; }
+    void clientDestroyed(DirEntryBrowserInterface*) override {}
+    std::vector<std::string> names;
 };
 
 // A browser over a real store, loaded and ready.
@@ -66,10 +94,29 @@ struct Browser
         widget.treeView()->selectionModel()->setCurrentIndex(model.indexFromNode(node),
                                                              QItemSelectionModel::ClearAndSelect);
     }
+    // The folder and entry commands as the menu offers them.
+    QAction* action(const QString& text)
+    {
+        if (menu.isEmpty())
+            widget.createCustomMenus(&menu, QStringLiteral("Job Template"), QStringLiteral("Job Templates"), true);
+        for (QAction* candidate : menu.actions()) {
+            if (candidate->text() == text)
+                return candidate;
+        }
+        return nullptr;
+    }
+    QStringList namesIn(const Node* folder) const
+    {
+        QStringList names;
+        for (const auto& child : (folder ? folder : model.root())->children())
+            names << child->displayName();
+        return names;
+    }
 
     TemplateCallbacks callbacks;
     DirEntryTreeModel model;
     DirEntryBrowserWidget widget;
+    QMenu menu;
 };
 
 std::string createFolder(TempStore& store, const std::string& name)
@@ -96,12 +143,21 @@ private slots:
     void init() { QSettings().clear(); }
     void newObjectGetsFirstFreeNameOfItsFolder_data();
     void newObjectGetsFirstFreeNameOfItsFolder();
+    void defaultNameWithoutBaseIsTheTypesName_data();
+    void defaultNameWithoutBaseIsTheTypesName();
     void savedNewObjectIsFoundAfterRestart();
     void modifiedObjectEnablesSave();
     void failedSaveKeepsObjectModified();
     void selectionCarriesLoadedObjects();
     void mayCloseAsksOnlyAboutUnsavedWork_data();
     void mayCloseAsksOnlyAboutUnsavedWork();
+    void unsavedQuestionCountsTheObjects_data();
+    void unsavedQuestionCountsTheObjects();
+    void editDuringSaveStaysModified();
+    void lastSelectionIsRestoredAtStart();
+    void folderCommandsAskThenAct_data();
+    void folderCommandsAskThenAct();
+    void refusedRenameKeepsTheStoredName();
     void refreshWhileSavingKeepsOneNode();
     void editedObjectSurvivesDeletionElsewhere();
     void renameThenSaveKeepsTheNewName();
@@ -110,18 +166,24 @@ private slots:
 
 void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder_data()
 {
+    QTest::addColumn<QString>("base");
     QTest::addColumn<QStringList>("inFolder");
     QTest::addColumn<QStringList>("elsewhere");
     QTest::addColumn<QString>("expected");
-    QTest::newRow("empty folder") << QStringList{} << QStringList{} << "Job Template";
-    QTest::newRow("base name taken") << QStringList{"Job Template"} << QStringList{} << "Job Template 2";
-    QTest::newRow("gap is filled") << QStringList{"Job Template", "Job Template 3"} << QStringList{} << "Job Template 2";
-    QTest::newRow("names of other folders do not count") << QStringList{} << QStringList{"Job Template"}
+    const QString base = QStringLiteral("Job Template");
+    QTest::newRow("empty folder") << base << QStringList{} << QStringList{} << "Job Template";
+    QTest::newRow("base name taken") << base << QStringList{"Job Template"} << QStringList{} << "Job Template 2";
+    QTest::newRow("gap is filled") << base << QStringList{"Job Template", "Job Template 3"} << QStringList{}
+                                   << "Job Template 2";
+    QTest::newRow("names of other folders do not count") << base << QStringList{} << QStringList{"Job Template"}
                                                          << "Job Template";
+    QTest::newRow("no base text names it after its type, unique in its folder")
+        << QString() << QStringList{"Job Template"} << QStringList{} << "Job Template 2";
 }
 
 void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder()
 {
+    QFETCH(QString, base);
     QFETCH(QStringList, inFolder);
     QFETCH(QStringList, elsewhere);
     QFETCH(QString, expected);
@@ -135,6 +197,7 @@ void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder()
         storeTemplate(store, name.toStdString(), other);
 
     Browser browser(store);
+    browser.callbacks.base = base;
     QTRY_VERIFY(browser.find(QStringLiteral("Folder")));
     browser.select(browser.find(QStringLiteral("Folder")));
     browser.widget.actionNew()->trigger();
@@ -143,6 +206,44 @@ void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder()
     QVERIFY(created);
     QVERIFY(created->isModified());
     QCOMPARE(created->parent(), browser.find(QStringLiteral("Folder")));
+}
+
+void tst_DirEntryBrowser::defaultNameWithoutBaseIsTheTypesName_data()
+{
+    QTest::addColumn<QString>("typeId");
+    QTest::addColumn<QString>("base");
+    QTest::addColumn<bool>("withBrowser");
+    QTest::addColumn<QStringList>("taken");
+    QTest::addColumn<QString>("expected");
+    const QString configuration = QString::fromStdString(MeasurementConfiguration::typeId());
+    const QString jobTemplate = QString::fromStdString(QCJobTemplate::typeId());
+    QTest::newRow("measurement configuration without a browser")
+        << configuration << QString() << false << QStringList{} << "Measurement Configuration";
+    QTest::newRow("measurement configuration whose name is taken in the folder")
+        << configuration << QString() << true
+        << QStringList{"Measurement Configuration", "Measurement Configuration 2"} << "Measurement Configuration 3";
+    QTest::newRow("job template without a browser")
+        << jobTemplate << QString() << false << QStringList{} << "Job Template";
+    QTest::newRow("a base text is used as given")
+        << configuration << "D65 Setup" << true << QStringList{"D65 Setup"} << "D65 Setup 2";
+    QTest::newRow("a type without a name of its own")
+        << "vemi.Unknown" << QString() << true << QStringList{"Object"} << "Object 2";
+}
+
+void tst_DirEntryBrowser::defaultNameWithoutBaseIsTheTypesName()
+{
+    QFETCH(QString, typeId);
+    QFETCH(QString, base);
+    QFETCH(bool, withBrowser);
+    QFETCH(QStringList, taken);
+    QFETCH(QString, expected);
+    FixedFolder folder;
+    for (const QString& name : taken)
+        folder.names.push_back(name.toStdString());
+    TypedCallbacks callbacks(typeId.toStdString());
+    if (withBrowser)
+        callbacks.setFolderBrowser(&folder);
+    QCOMPARE(QString::fromStdString(callbacks.defaultNamedObjectName(base)), expected);
 }
 
 void tst_DirEntryBrowser::savedNewObjectIsFoundAfterRestart()
@@ -261,6 +362,171 @@ void tst_DirEntryBrowser::mayCloseAsksOnlyAboutUnsavedWork()
     const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
     QVERIFY(stored);
     QCOMPARE(stored->description() == "edited", modified && savedAfterwards);
+}
+
+void tst_DirEntryBrowser::unsavedQuestionCountsTheObjects_data()
+{
+    QTest::addColumn<int>("count");
+    QTest::addColumn<bool>("menusFirst");
+    QTest::addColumn<QString>("expected");
+    const QString one = QStringLiteral("This Job Template has unsaved changes. Save it before closing?");
+    const QString three = QStringLiteral("These 3 Job Templates have unsaved changes. Save them before closing?");
+    QTest::newRow("one object, menus set up before") << 1 << true << one;
+    QTest::newRow("one object, no menus set up") << 1 << false << one;
+    QTest::newRow("three objects, menus set up before") << 3 << true << three;
+    QTest::newRow("three objects, no menus set up") << 3 << false << three;
+}
+
+void tst_DirEntryBrowser::unsavedQuestionCountsTheObjects()
+{
+    QFETCH(int, count);
+    QFETCH(bool, menusFirst);
+    QFETCH(QString, expected);
+    TempStore store;
+    Browser browser(store);
+    if (menusFirst)
+        QVERIFY(browser.action(QStringLiteral("Delete")));
+    for (int i = 0; i < count; ++i)
+        browser.widget.actionNew()->trigger();
+    QString question;
+    ModalAnswer::clickInNextMessageBox(QMessageBox::Cancel, &question);
+
+    QVERIFY(!browser.widget.mayClose());
+    QVERIFY2(question.startsWith(expected), qPrintable(question));
+    for (const QString& name : browser.namesIn(nullptr))
+        QVERIFY2(question.contains(QStringLiteral("• ") + name), qPrintable(question));
+}
+
+// An edit that arrives while its object is being saved is not in the store:
+// the object must stay marked, or closing would lose the edit without asking.
+void tst_DirEntryBrowser::editDuringSaveStaysModified()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
+    auto jobTemplate = std::dynamic_pointer_cast<QCJobTemplate>(browser.find(QStringLiteral("Door Panel"))->object());
+    QSignalSpy saved(&browser.model, &DirEntryTreeModel::sgItemChanged);
+    browser.widget.namedObjectWasModified(jobTemplate);
+    browser.widget.actionSave()->trigger();
+    // The store answers through the event loop, so this edit comes before the answer.
+    jobTemplate->setDescription("edited while saving");
+    browser.widget.namedObjectWasModified(jobTemplate);
+
+    QTRY_COMPARE(saved.count(), 1);
+    QVERIFY(browser.find(QStringLiteral("Door Panel"))->isModified());
+    QVERIFY(browser.widget.actionSave()->isEnabled());
+    ModalAnswer::clickInNextMessageBox(QMessageBox::Cancel);
+    QVERIFY(!browser.widget.mayClose());
+}
+
+void tst_DirEntryBrowser::lastSelectionIsRestoredAtStart()
+{
+    TempStore store;
+    const std::string folder = createFolder(store, "Interior");
+    storeTemplate(store, "Door Panel", "");
+    storeTemplate(store, "Dashboard", folder);
+    {
+        Browser browser(store);
+        QSignalSpy selections(&browser.widget, &DirEntryBrowserWidget::sgSelectionChanged);
+        QVERIFY(browser.openLoaded(QStringLiteral("Dashboard")));
+        QTRY_VERIFY(!selections.isEmpty());
+    }
+    Browser restarted(store);
+    // The remembered entry sits in a collapsed folder: it is opened and selected.
+    QTRY_VERIFY(restarted.widget.treeView()->selectionModel()->selectedRows().size() == 1);
+    Node* selected = restarted.model.nodeFromIndex(restarted.widget.treeView()->selectionModel()->selectedRows().first());
+    QCOMPARE(selected->displayName(), QStringLiteral("Dashboard"));
+    QTRY_VERIFY(selected->object());
+    QVERIFY(restarted.widget.treeView()->isExpanded(restarted.model.indexFromNode(selected->parent())));
+}
+
+void tst_DirEntryBrowser::folderCommandsAskThenAct_data()
+{
+    QTest::addColumn<QString>("command");
+    QTest::addColumn<QStringList>("answers");
+    QTest::addColumn<QStringList>("topLevel");
+    QTest::addColumn<QStringList>("inFolder");
+    QTest::addColumn<QString>("question");
+    // The tree holds the folders "Interior" and "New Folder" and the template
+    // "Door Panel", which is selected.
+    const QStringList unchanged{"Interior", "New Folder", "Door Panel"};
+    QTest::newRow("new folder suggests a free name")
+        << "New Folder…" << QStringList{"Trim"} << QStringList{"Interior", "New Folder", "Trim", "Door Panel"}
+        << QStringList{} << "New Folder: Folder name: [New Folder 2]";
+    QTest::newRow("cancelled new folder creates nothing")
+        << "New Folder…" << QStringList{} << unchanged << QStringList{} << "New Folder: Folder name: [New Folder 2]";
+    QTest::newRow("rename changes the entry's name")
+        << "Rename…" << QStringList{"Door Trim"} << QStringList{"Interior", "New Folder", "Door Trim"}
+        << QStringList{} << "Rename: New name: [Door Panel]";
+    QTest::newRow("move files the entry in the folder chosen")
+        << "Move To…" << QStringList{"Interior"} << QStringList{"Interior", "New Folder"} << QStringList{"Door Panel"}
+        << "Move To: Folder: [(top level), Interior, New Folder]";
+    QTest::newRow("confirmed delete removes the entry")
+        << "Delete" << QStringList{"yes"} << QStringList{"Interior", "New Folder"} << QStringList{}
+        << "Delete: Delete \"Door Panel\" with everything in it? This cannot be undone.";
+    QTest::newRow("declined delete keeps the entry")
+        << "Delete" << QStringList{"no"} << unchanged << QStringList{}
+        << "Delete: Delete \"Door Panel\" with everything in it? This cannot be undone.";
+}
+
+void tst_DirEntryBrowser::folderCommandsAskThenAct()
+{
+    QFETCH(QString, command);
+    QFETCH(QStringList, answers);
+    QFETCH(QStringList, topLevel);
+    QFETCH(QStringList, inFolder);
+    QFETCH(QString, question);
+    TempStore store;
+    createFolder(store, "Interior");
+    storeTemplate(store, "Door Panel", "");
+    createFolder(store, "New Folder");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
+
+    ScriptedAsker asker;
+    for (const QString& answer : answers) {
+        if (command == QStringLiteral("Delete"))
+            asker.scriptConfirm(answer == QLatin1String("yes"));
+        else if (command == QStringLiteral("Move To…"))
+            asker.scriptItem(answer);
+        else
+            asker.scriptText(answer);
+    }
+    browser.widget.folderCommands()->setAsker(&asker);
+    QAction* action = browser.action(command);
+    QVERIFY(action && action->isEnabled());
+    action->trigger();
+
+    QCOMPARE(asker.asked(), QStringList{question});
+    QTRY_COMPARE(browser.namesIn(nullptr), topLevel);
+    QTRY_COMPARE(browser.namesIn(browser.find(QStringLiteral("Interior"))), inFolder);
+    // What the tree shows is what the store holds.
+    Browser restarted(store);
+    QTRY_COMPARE(restarted.namesIn(nullptr), topLevel);
+}
+
+// A rename the store refuses must not leave the open object with a name the
+// store does not have: a later save would store it under a name never confirmed.
+void tst_DirEntryBrowser::refusedRenameKeepsTheStoredName()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    StoreOptions readOnly;
+    readOnly.readOnly = true;
+    store.reopen(readOnly);
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
+    Node* node = browser.find(QStringLiteral("Door Panel"));
+    ScriptedAsker asker;
+    asker.scriptText(QStringLiteral("Door Trim"));
+    browser.widget.folderCommands()->setAsker(&asker);
+
+    browser.action(QStringLiteral("Rename…"))->trigger();
+    QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
+    QVERIFY(browser.widget.findChild<QMessageBox*>()->text().contains(QStringLiteral("read-only")));
+    QCOMPARE(node->displayName(), QStringLiteral("Door Panel"));
+    QCOMPARE(node->object()->name(), std::string("Door Panel"));
 }
 
 void tst_DirEntryBrowser::refreshWhileSavingKeepsOneNode()

@@ -3,7 +3,6 @@
 
 #include "host/widgets/DirEntryBrowserWidget.h"
 #include "host/widgets/DirEntryTreeModel.h"
-#include "plugin/PellamSettings.h"
 #include "plugin/PellamSettingsKeys.h"
 #include "plugin/PellamWidget.h"
 #include "host/domain/QCJobTemplate.h"
@@ -53,7 +52,6 @@ private slots:
     void selectionDecidesPageAndTemplate();
     void newTemplateIsNamedAndBecomesModelsTemplate();
     void editorModificationReachesBrowser();
-    void settingsObjectIsCommonSettings();
 
 private:
     PellamWidget* createWidget();
@@ -101,9 +99,14 @@ void tst_PellamWidget::firstStartShowsPlaceholderWithDefaultSizes()
     QVERIFY(QTest::qWaitForWindowExposed(m_host.get()));
     const QList<int> sizes = m_widget->findChild<QSplitter*>()->sizes();
     QCOMPARE(sizes.size(), 2);
-    // Qt clamps sizes set before the first show to the widgets' size hints;
-    // what must hold is that the editor gets by far the larger share.
-    QVERIFY2(sizes[1] >= 4 * sizes[0], qPrintable(QStringLiteral("%1 %2").arg(sizes[0]).arg(sizes[1])));
+    // Qt raises the browser's 100 to its minimum width before it shares out
+    // the rest, so the split is not exactly 1 : 6. What the user must see:
+    // the editor has by far the larger share, and the browser is not
+    // squeezed to its minimum, as it is without default sizes.
+    const int browserMinimum = m_widget->findChild<DirEntryBrowserWidget*>()->minimumSizeHint().width();
+    const QString actual = QStringLiteral("%1 %2 (browser minimum %3)").arg(sizes[0]).arg(sizes[1]).arg(browserMinimum);
+    QVERIFY2(sizes[1] >= 4 * sizes[0], qPrintable(actual));
+    QVERIFY2(sizes[0] > browserMinimum, qPrintable(actual));
     QCOMPARE(pages()->currentIndex(), 0);
     auto* placeholder = qobject_cast<QLabel*>(pages()->widget(0));
     QVERIFY(placeholder);
@@ -204,17 +207,6 @@ void tst_PellamWidget::editorModificationReachesBrowser()
     emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
     QVERIFY(node->isModified());
     QVERIFY(browser->actionSave()->isEnabled());
-}
-
-void tst_PellamWidget::settingsObjectIsCommonSettings()
-{
-    PellamSettings settings(QStringLiteral("QC Job Template Editor"));
-    QCOMPARE(settings.qt_metacast("vemi::PellamSettings"), static_cast<void*>(&settings));
-    QCOMPARE(settings.qt_metacast("CommonSettings"), static_cast<void*>(static_cast<CommonSettings*>(&settings)));
-    QCOMPARE(settings.settingsName(), std::string("QC Job Template Editor"));
-    QCOMPARE(settings.title(), settings.settingsName());
-    QVERIFY(settings.isUserVisible());
-    QVERIFY(!settings.isExpertOnly());
 }
 
 QC_TEST_MAIN(tst_PellamWidget)

@@ -27,9 +27,9 @@ class tst_PluginEntry : public QObject
 private slots:
     void initTestCase();
     void metadataNamesClientWithoutJson();
-    void instanceIsOneObjectThatIsAClient();
     void clientAnswersTheHostsQuestions();
-    void pluginImageIsCompiledIn();
+    void entryPointsBeforeContentDoNothing_data();
+    void entryPointsBeforeContentDoNothing();
     void fileMenuHoldsBrowserEntriesThenRefresh();
     void refreshReachesTheBrowserOnce();
     void toolBarGetsNewOpenSaveWithIcons();
@@ -66,15 +66,6 @@ void tst_PluginEntry::metadataNamesClientWithoutJson()
     QVERIFY(metaData.value(QStringLiteral("MetaData")).toObject().isEmpty());
 }
 
-void tst_PluginEntry::instanceIsOneObjectThatIsAClient()
-{
-    QObject* first = m_loader->instance();
-    QCOMPARE(m_loader->instance(), first);
-    QCOMPARE(QPluginLoader(m_pluginPath).instance(), first);
-    QVERIFY(first->qt_metacast("ClientInterface"));
-    QVERIFY(!first->parent());
-}
-
 void tst_PluginEntry::clientAnswersTheHostsQuestions()
 {
     QCOMPARE(m_client->clientTitle(), QStringLiteral("QC Job Template Editor"));
@@ -90,11 +81,43 @@ void tst_PluginEntry::clientAnswersTheHostsQuestions()
     QVERIFY(QFile::exists(QStringLiteral(":/StyleSheets/Pellam.stylesheet")));
 }
 
-void tst_PluginEntry::pluginImageIsCompiledIn()
+void tst_PluginEntry::entryPointsBeforeContentDoNothing_data()
 {
-    const QImage image(QStringLiteral(":/images/PellamIcon.png"));
-    QCOMPARE(image.size(), QSize(47, 52));
-    QVERIFY(image.hasAlphaChannel());
+    QTest::addColumn<QString>("entryPoint");
+    QTest::newRow("mayClose answers true") << "mayClose";
+    QTest::newRow("refresh") << "refresh";
+    QTest::newRow("addMenus adds no menu") << "addMenus";
+    QTest::newRow("addToolBarActions adds no action") << "addToolBarActions";
+}
+
+// A host may call the entry points before createContent(), when the tab has
+// no browser yet.
+void tst_PluginEntry::entryPointsBeforeContentDoNothing()
+{
+    QFETCH(QString, entryPoint);
+    TempStore store;
+    QWidget host;
+    AppWidget* tab = m_client->createAppWidget(store.model(), &host);
+    CorvoTopBar topBar;
+    QToolBar bar;
+    if (entryPoint == QLatin1String("mayClose"))
+        QVERIFY(tab->mayClose());
+    else if (entryPoint == QLatin1String("refresh"))
+        tab->refresh();
+    else if (entryPoint == QLatin1String("addMenus"))
+        tab->addMenus(&topBar);
+    else
+        tab->addToolBarActions(&bar);
+    QVERIFY(topBar.actions().isEmpty());
+    QVERIFY(bar.actions().isEmpty());
+
+    // The content made afterwards serves the same calls as usual.
+    tab->createContent();
+    tab->addMenus(&topBar);
+    tab->addToolBarActions(&bar);
+    QCOMPARE(topBar.actions().size(), 1);
+    QCOMPARE(bar.actions().size(), 3);
+    QVERIFY(tab->mayClose());
 }
 
 AppWidget* tst_PluginEntry::createTab(TempStore& store, QWidget* parent)

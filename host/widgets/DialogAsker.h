@@ -1,0 +1,18 @@
+#pragma once
+
+#include "host/widgets/UserAsker.h"
+
+namespace vemi {
+
+// Asks with Qt's standard modal dialogs (QInputDialog, QMessageBox).
+class DialogAsker : public UserAsker
+{
+public:
+    std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
+                                   const QString& suggestion) override;
+    std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
+                               const QStringList& items) override;
+    bool confirm(QWidget* parent, const QString& title, const QString& question) override;
+};
+
+} // namespace vemi

@@ -1,0 +1,133 @@
+#include "host/widgets/FolderCommands.h"
+
+#include "host/widgets/DialogAsker.h"
+#include "host/widgets/DirEntryTreeModel.h"
+#include "host/widgets/FirstFreeName.h"
+
+#include <QWidget>
+
+namespace vemi {
+
+using Node = BaseObjectTreeModel::Node;
+
+FolderCommands::FolderCommands(QWidget* dialogParent)
+    : QObject(dialogParent), m_dialogParent(dialogParent), m_dialogs(std::make_unique<DialogAsker>()),
+      m_asker(m_dialogs.get())
+{
+}
+
+FolderCommands::~FolderCommands() = default;
+
+void FolderCommands::setAsker(UserAsker* asker)
+{
+    m_asker = asker ? asker : m_dialogs.get();
+}
+
+// The questions run their own event loop, in which answers from the store may
+// rebuild or shrink the tree: the commands hold serials across a question, not nodes.
+
+std::vector<quint64> FolderCommands::serialsOf(const QVector<Node*>& nodes)
+{
+    std::vector<quint64> serials;
+    for (const Node* node : nodes)
+        serials.push_back(node ? node->serial() : 0);
+    return serials;
+}
+
+std::vector<Node*> FolderCommands::liveNodes(const std::vector<quint64>& serials) const
+{
+    std::vector<Node*> nodes;
+    for (quint64 serial : serials) {
+        if (Node* node = m_model->findBySerial(serial))
+            nodes.push_back(node);
+    }
+    return nodes;
+}
+
+QString FolderCommands::pathText(const Node* node) const
+{
+    QStringList path;
+    for (const std::string& folder : m_model->pathOf(node))
+        path << QString::fromStdString(folder);
+    if (!node->isFolder())
+        path << node->displayName();
+    return path.join(QLatin1Char('/'));
+}
+
+void FolderCommands::createFolder(Node* current)
+{
+    if (!m_model)
+        return;
+    Node* parent = m_model->folderFor(current);
+    const QString suggestion = QString::fromStdString(
+        firstFreeName(tr("New Folder").toStdString(), m_model->namesIn(parent)));
+    const quint64 parentSerial = parent ? parent->serial() : 0;
+    const std::optional<QString> answer =
+        m_asker->askText(m_dialogParent, tr("New Folder"), tr("Folder name:"), suggestion);
+    const QString name = answer.value_or(QString()).trimmed();
+    if (name.isEmpty())
+        return;
+    Node* liveParent = parentSerial ? m_model->findBySerial(parentSerial) : nullptr;
+    if (parentSerial && !liveParent) {
+        emit sgErrorOccurred(tr("The folder was deleted meanwhile."));
+        return;
+    }
+    m_model->createFolder(liveParent, name.toStdString(), {});
+}
+
+void FolderCommands::rename(Node* node)
+{
+    if (!m_model || !node)
+        return;
+    const quint64 serial = node->serial();
+    const QString oldName = node->displayName();
+    const std::optional<QString> answer = m_asker->askText(m_dialogParent, tr("Rename"), tr("New name:"), oldName);
+    const QString name = answer.value_or(QString()).trimmed();
+    node = m_model->findBySerial(serial);
+    if (node && !name.isEmpty() && name != oldName)
+        m_model->renameNode(node, name.toStdString(), {});
+}
+
+void FolderCommands::move(const QVector<Node*>& nodes)
+{
+    if (!m_model || nodes.isEmpty())
+        return;
+    const std::vector<quint64> moving = serialsOf(nodes);
+    QStringList paths{tr("(top level)")};
+    QVector<Node*> folders{nullptr};
+    for (Node* node : m_model->descendants(m_model->root())) {
+        if (node->isFolder()) {
+            paths << pathText(node);
+            folders.append(node);
+        }
+    }
+    const std::vector<quint64> folderSerials = serialsOf(folders);
+    const std::optional<int> chosen = m_asker->askItem(m_dialogParent, tr("Move To"), tr("Folder:"), paths);
+    if (!chosen || *chosen < 0 || *chosen >= paths.size())
+        return;
+    const quint64 targetSerial = folderSerials[size_t(*chosen)];
+    Node* target = targetSerial ? m_model->findBySerial(targetSerial) : nullptr;
+    if (targetSerial && !target) {
+        emit sgErrorOccurred(tr("The folder was deleted meanwhile."));
+        return;
+    }
+    for (Node* node : liveNodes(moving))
+        m_model->moveNode(node, target, {});
+}
+
+void FolderCommands::remove(const QVector<Node*>& nodes)
+{
+    if (!m_model || nodes.isEmpty())
+        return;
+    const std::vector<quint64> serials = serialsOf(nodes);
+    const QString what = nodes.size() == 1 ? QStringLiteral("\"%1\"").arg(nodes.first()->displayName())
+                                           : tr("%1 items").arg(nodes.size());
+    if (!m_asker->confirm(m_dialogParent, tr("Delete"),
+                          tr("Delete %1 with everything in it? This cannot be undone.").arg(what)))
+        return;
+    const std::vector<Node*> deleting = liveNodes(serials);
+    if (!deleting.empty())
+        m_model->deleteNodes(deleting, {});
+}
+
+} // namespace vemi
