@@ -34,4 +34,8 @@ void BaseObject::resolveReferences(const ObjectLookup&)
 {
 }
 
+void BaseObject::dropReferences(const std::vector<std::string>&)
+{
+}
+
 } // namespace vemi

@@ -44,6 +44,8 @@ public:
     using ObjectLookup = std::function<std::shared_ptr<BaseObject>(const std::string& id)>;
     // Replaces each stand-in by lookup(id); a stand-in whose lookup is empty stays.
     virtual void resolveReferences(const ObjectLookup& lookup);
+    // Removes the members with these ids, e.g. those deleted since the object was stored.
+    virtual void dropReferences(const std::vector<std::string>& ids);
 
 private:
     std::string m_id;

@@ -25,6 +25,7 @@ public:
     void readFields(const QCborMap& map) override;
     std::vector<std::string> referencedIds() const override;
     void resolveReferences(const ObjectLookup& lookup) override;
+    void dropReferences(const std::vector<std::string>& ids) override;
 
 private:
     std::vector<std::shared_ptr<Standard>> m_standards;

@@ -39,13 +39,18 @@ std::shared_ptr<BaseObject> StoredObjectReader::decode(const std::string& id, co
         throw DecodeError("object " + id + ": " + error.what());
     }
     if (depth >= 2 && !object->referencedIds().empty()) {
-        object->resolveReferences([this, depth](const std::string& memberId) -> std::shared_ptr<BaseObject> {
+        std::vector<std::string> deleted;
+        object->resolveReferences([&](const std::string& memberId) -> std::shared_ptr<BaseObject> {
             try {
                 return read(memberId, std::string(), depth - 1);
             } catch (const StoreError&) {
-                return {}; // a member deleted since stays a stand-in
+                // Deleted since the library was stored: no longer a member.
+                deleted.push_back(memberId);
+                return {};
             }
         });
+        if (!deleted.empty())
+            object->dropReferences(deleted);
     }
     return object;
 }

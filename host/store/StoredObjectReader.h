@@ -12,7 +12,8 @@ class BaseObject;
 class StoreDatabase;
 
 // Reads stored objects and decodes them; at depth 2 or more the objects that
-// a library refers to are read too (one level less deep) and put in place.
+// a library refers to are read too (one level less deep) and put in place;
+// members that no longer exist are left out.
 class StoredObjectReader
 {
 public:

@@ -18,11 +18,13 @@
 #include "host/domain/Header.h"
 #include "host/store/MoveDirItem.h"
 #include "host/domain/ObjectCodec.h"
+#include "host/domain/PropertyLibrary.h"
 #include "host/domain/QCJobTemplate.h"
 #include "host/store/QtCommand.h"
 #include "host/store/RenameDirItem.h"
 #include "host/domain/SchematicImage.h"
 #include "host/domain/Standard.h"
+#include "host/domain/TagDefinition.h"
 #include "host/store/StoreDatabase.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
@@ -68,6 +70,65 @@ std::string folderIdOf(const TempStore::Answer& answer)
     return folder ? folder->folder().id : std::string();
 }
 
+std::string entryIdOf(const std::shared_ptr<Response>& saved)
+{
+    const auto update = std::dynamic_pointer_cast<UpdateObjectResponse>(saved);
+    return update && update->entry() ? update->entry()->id() : std::string();
+}
+
+// A library of three members of its kind, as the store keeps it.
+struct StoredLibrary
+{
+    std::shared_ptr<BaseObject> library;
+    std::vector<std::shared_ptr<NamedObject>> members;
+    std::function<std::vector<std::shared_ptr<NamedObject>>(const BaseObject&)> membersOf;
+};
+
+StoredLibrary makeLibrary(const QString& kind)
+{
+    StoredLibrary result;
+    const char* const names[] = {"Signal Red", "Ocean Blue", "Sand Yellow"};
+    if (kind == QLatin1String("standards")) {
+        auto library = std::make_shared<ColorStandardsLibrary>();
+        std::vector<std::shared_ptr<Standard>> standards;
+        for (const char* name : names) {
+            standards.push_back(std::make_shared<Standard>());
+            standards.back()->setName(name);
+        }
+        library->setStandards(standards);
+        result.library = library;
+        result.members.assign(standards.begin(), standards.end());
+        result.membersOf = [](const BaseObject& object) {
+            const auto members = dynamic_cast<const ColorStandardsLibrary&>(object).standards();
+            return std::vector<std::shared_ptr<NamedObject>>(members.begin(), members.end());
+        };
+    } else {
+        auto library = std::make_shared<PropertyLibrary>();
+        std::vector<std::shared_ptr<TagDefinition>> definitions;
+        for (const char* name : names) {
+            definitions.push_back(std::make_shared<TagDefinition>());
+            definitions.back()->setName(name);
+        }
+        library->setProperties(definitions);
+        result.library = library;
+        result.members.assign(definitions.begin(), definitions.end());
+        result.membersOf = [](const BaseObject& object) {
+            const auto members = dynamic_cast<const PropertyLibrary&>(object).properties();
+            return std::vector<std::shared_ptr<NamedObject>>(members.begin(), members.end());
+        };
+    }
+    result.library->header()->setName("Interior");
+    return result;
+}
+
+QStringList namesOf(const std::vector<std::shared_ptr<NamedObject>>& objects)
+{
+    QStringList names;
+    for (const auto& object : objects)
+        names << QString::fromStdString(object->name());
+    return names;
+}
+
 } // namespace
 
 class tst_Store : public QObject
@@ -89,6 +150,8 @@ private slots:
     void readOnlyStoreRefusesWrites();
     void lockedStoreReportsAndRecovers();
     void libraryMembersResolveAtDepthTwo();
+    void deletedLibraryMembersAreLeftOut_data();
+    void deletedLibraryMembersAreLeftOut();
     void getObjectsListsAllOrTheIdsGiven();
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
@@ -368,6 +431,38 @@ void tst_Store::libraryMembersResolveAtDepthTwo()
     QVERIFY(deep);
     QCOMPARE(deep->standards()[0]->name(), std::string("Signal Red"));
     QCOMPARE(deep->standards()[1]->name(), std::string("Ocean Blue"));
+}
+
+void tst_Store::deletedLibraryMembersAreLeftOut_data()
+{
+    QTest::addColumn<QString>("kind");
+    QTest::newRow("colour standards library") << "standards";
+    QTest::newRow("property library") << "properties";
+}
+
+void tst_Store::deletedLibraryMembersAreLeftOut()
+{
+    QFETCH(QString, kind);
+    TempStore store;
+    const StoredLibrary stored = makeLibrary(kind);
+    const std::string topLevel;
+    std::vector<std::string> entries;
+    for (const auto& member : stored.members)
+        entries.push_back(entryIdOf(store.save(member, &topLevel)));
+    QVERIFY(store.save(stored.library));
+    QVERIFY(!entries[1].empty());
+    QVERIFY(!store.run(std::make_shared<DeleteDirItems>(std::vector<std::string>{},
+                                                        std::vector<std::string>{entries[1]})).error);
+
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(stored.library->objectTypeId());
+    get->setId(stored.library->id());
+    get->setDepth(2);
+    const auto answer = store.run(get);
+    QVERIFY(!answer.error);
+    const auto response = std::dynamic_pointer_cast<GetMarloObjectResponse>(answer.response);
+    QVERIFY(response && response->object());
+    QCOMPARE(namesOf(stored.membersOf(*response->object())), QStringList({"Signal Red", "Sand Yellow"}));
 }
 
 void tst_Store::getObjectsListsAllOrTheIdsGiven()
