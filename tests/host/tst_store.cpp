@@ -76,6 +76,15 @@ std::string entryIdOf(const std::shared_ptr<Response>& saved)
     return update && update->entry() ? update->entry()->id() : std::string();
 }
 
+// Bytes that no decoder takes for an object.
+const QByteArray kGarbage("\xa3\x01garbage", 9);
+
+bool damage(const QString& storePath, const std::string& id)
+{
+    RawConnection raw(storePath);
+    return raw.exec(QStringLiteral("UPDATE objects SET data = ? WHERE id = ?"), {kGarbage, QString::fromStdString(id)});
+}
+
 // A library of three members of its kind, as the store keeps it.
 struct StoredLibrary
 {
@@ -129,6 +138,14 @@ QStringList namesOf(const std::vector<std::shared_ptr<NamedObject>>& objects)
     return names;
 }
 
+QStringList namesOf(const std::vector<std::shared_ptr<BaseObject>>& objects)
+{
+    QStringList names;
+    for (const auto& object : objects)
+        names << QString::fromStdString(object->header()->name());
+    return names;
+}
+
 } // namespace
 
 class tst_Store : public QObject
@@ -152,6 +169,9 @@ private slots:
     void libraryMembersResolveAtDepthTwo();
     void deletedLibraryMembersAreLeftOut_data();
     void deletedLibraryMembersAreLeftOut();
+    void damagedObjectsAreLeftOutAndNamed();
+    void damagedLibraryMemberIsLeftOutAndNamed_data();
+    void damagedLibraryMemberIsLeftOutAndNamed();
     void getObjectsListsAllOrTheIdsGiven();
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
@@ -350,6 +370,7 @@ void tst_Store::damagedObjectIsReportedByItsId()
     const auto answer = store.run(get);
     QVERIFY(answer.error);
     QVERIFY2(answer.error->message().contains(QString::fromStdString(damaged->id())), qPrintable(answer.error->message()));
+    QVERIFY2(answer.error->message().contains(QStringLiteral("\"Damaged\"")), qPrintable(answer.error->message()));
     QVERIFY(store.fetch(QCJobTemplate::typeId(), intact->id()));
 }
 
@@ -463,6 +484,88 @@ void tst_Store::deletedLibraryMembersAreLeftOut()
     const auto response = std::dynamic_pointer_cast<GetMarloObjectResponse>(answer.response);
     QVERIFY(response && response->object());
     QCOMPARE(namesOf(stored.membersOf(*response->object())), QStringList({"Signal Red", "Sand Yellow"}));
+    // A deleted member is no fault of the store: nothing to report.
+    QCOMPARE(response->problems(), QStringList());
+}
+
+void tst_Store::damagedObjectsAreLeftOutAndNamed()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string samples = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "Samples")));
+    const std::string doors = folderIdOf(store.run(std::make_shared<CreateFolder>(type, samples, "Doors")));
+    auto first = makeTemplate("Bonnet");
+    auto damaged = makeTemplate("Door Panel");
+    auto last = makeTemplate("Tailgate");
+    QVERIFY(store.save(first, &samples));
+    QVERIFY(store.save(damaged, &doors));
+    QVERIFY(store.save(last));
+    QVERIFY(damage(store.path(), damaged->id()));
+
+    const auto check = [&](const std::vector<std::string>& ids) {
+        auto get = std::make_shared<GetMarloObjects>();
+        get->setType(type);
+        get->setIds(ids);
+        const auto answer = store.run(get);
+        QVERIFY2(!answer.error, answer.error ? qPrintable(answer.error->message()) : "");
+        const auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(answer.response);
+        QVERIFY(response);
+        QCOMPARE(namesOf(response->objects()), QStringList({"Bonnet", "Tailgate"}));
+        QCOMPARE(response->problems().size(), 1);
+        const QString problem = response->problems().first();
+        QVERIFY2(problem.contains(QStringLiteral("\"Door Panel\"")), qPrintable(problem));
+        QVERIFY2(problem.contains(QStringLiteral("\"Samples/Doors\"")), qPrintable(problem));
+        QVERIFY2(problem.contains(QStringLiteral("damaged")), qPrintable(problem));
+    };
+    check({});
+    check({first->id(), damaged->id(), last->id()});
+}
+
+void tst_Store::damagedLibraryMemberIsLeftOutAndNamed_data()
+{
+    deletedLibraryMembersAreLeftOut_data();
+}
+
+void tst_Store::damagedLibraryMemberIsLeftOutAndNamed()
+{
+    QFETCH(QString, kind);
+    TempStore store;
+    const StoredLibrary stored = makeLibrary(kind);
+    const std::string memberType = stored.members[0]->objectTypeId();
+    const std::string reds = folderIdOf(store.run(std::make_shared<CreateFolder>(memberType, "", "Reds")));
+    QVERIFY(!reds.empty());
+    const std::string topLevel;
+    QVERIFY(store.save(stored.members[0], &reds));
+    QVERIFY(store.save(stored.members[1], &topLevel));
+    QVERIFY(store.save(stored.members[2], &topLevel));
+    QVERIFY(store.save(stored.library));
+    QVERIFY(damage(store.path(), stored.members[0]->id()));
+
+    const auto check = [&](const std::shared_ptr<BaseObject>& library, const QStringList& problems) {
+        QVERIFY(library);
+        QCOMPARE(namesOf(stored.membersOf(*library)), QStringList({"Ocean Blue", "Sand Yellow"}));
+        QCOMPARE(problems.size(), 1);
+        QVERIFY2(problems[0].contains(QStringLiteral("\"Signal Red\" in the folder \"Reds\"")), qPrintable(problems[0]));
+        QVERIFY2(problems[0].contains(QStringLiteral("\"Interior\"")), qPrintable(problems[0]));
+    };
+    auto getOne = std::make_shared<GetMarloObject>();
+    getOne->setType(stored.library->objectTypeId());
+    getOne->setId(stored.library->id());
+    getOne->setDepth(2);
+    const auto one = store.run(getOne);
+    QVERIFY2(!one.error, one.error ? qPrintable(one.error->message()) : "");
+    const auto oneResponse = std::dynamic_pointer_cast<GetMarloObjectResponse>(one.response);
+    QVERIFY(oneResponse);
+    check(oneResponse->object(), oneResponse->problems());
+
+    auto getAll = std::make_shared<GetMarloObjects>();
+    getAll->setType(stored.library->objectTypeId());
+    getAll->setDepth(2);
+    const auto all = store.run(getAll);
+    QVERIFY(!all.error);
+    const auto allResponse = std::dynamic_pointer_cast<GetMarloObjectsResponse>(all.response);
+    QVERIFY(allResponse && allResponse->objects().size() == 1);
+    check(allResponse->objects()[0], allResponse->problems());
 }
 
 void tst_Store::getObjectsListsAllOrTheIdsGiven()
