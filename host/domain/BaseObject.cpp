@@ -30,6 +30,11 @@ std::vector<std::string> BaseObject::referencedIds() const
     return {};
 }
 
+std::string BaseObject::referencedTypeId() const
+{
+    return {};
+}
+
 void BaseObject::resolveReferences(const ObjectLookup&)
 {
 }

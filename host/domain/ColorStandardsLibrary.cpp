@@ -51,6 +51,11 @@ std::vector<std::string> ColorStandardsLibrary::referencedIds() const
     return ids;
 }
 
+std::string ColorStandardsLibrary::referencedTypeId() const
+{
+    return Standard::typeId();
+}
+
 void ColorStandardsLibrary::resolveReferences(const ObjectLookup& lookup)
 {
     for (auto& standard : m_standards) {

@@ -51,6 +51,11 @@ std::vector<std::string> PropertyLibrary::referencedIds() const
     return ids;
 }
 
+std::string PropertyLibrary::referencedTypeId() const
+{
+    return TagDefinition::typeId();
+}
+
 void PropertyLibrary::resolveReferences(const ObjectLookup& lookup)
 {
     for (auto& property : m_properties) {

@@ -83,6 +83,11 @@ std::shared_ptr<BaseObject> StoredObjectReader::decode(const Row& row, int depth
     } catch (const DecodeError& error) {
         throw DecodeError("object " + row.id + ": " + error.what());
     }
+    // The row's type is what every query selects by; content of another type
+    // would reach callers that cast to the row's type.
+    if (object->objectTypeId() != row.type)
+        throw DecodeError("object " + row.id + " is stored as a " + row.type + " but holds a "
+                          + object->objectTypeId());
     if (depth >= 2 && !object->referencedIds().empty())
         resolveMembers(*object, depth);
     return object;
@@ -90,6 +95,7 @@ std::shared_ptr<BaseObject> StoredObjectReader::decode(const Row& row, int depth
 
 void StoredObjectReader::resolveMembers(BaseObject& library, int depth)
 {
+    const std::string memberType = library.referencedTypeId();
     std::vector<std::string> leftOut;
     library.resolveReferences([&](const std::string& memberId) -> std::shared_ptr<BaseObject> {
         QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data FROM objects WHERE id = ?"),
@@ -102,6 +108,8 @@ void StoredObjectReader::resolveMembers(BaseObject& library, int depth)
         const Row row{memberId, query.value(0).toString().toStdString(), query.value(1).toByteArray()};
         query.finish();
         try {
+            if (!memberType.empty() && row.type != memberType)
+                throw DecodeError("object " + memberId + " is a " + row.type + ", not a " + memberType);
             return decode(row, depth - 1);
         } catch (const DecodeError& error) {
             m_problems << QStringLiteral("%1, a member of %2, is damaged and was left out: %3")

@@ -15,7 +15,8 @@ class StoreDatabase;
 // Reads stored objects and decodes them; at depth 2 or more the objects that
 // a library refers to are read too (one level less deep) and put in place.
 // Members that no longer exist are left out; damaged members are left out and
-// noted in problems(). A damaged object is one whose bytes cannot be decoded.
+// noted in problems(). A damaged object is one whose bytes cannot be decoded
+// or whose decoded type is not the type its row is stored under.
 class StoredObjectReader
 {
 public:

@@ -172,6 +172,7 @@ private slots:
     void damagedObjectsAreLeftOutAndNamed();
     void damagedLibraryMemberIsLeftOutAndNamed_data();
     void damagedLibraryMemberIsLeftOutAndNamed();
+    void contentOfAnotherTypeIsDamaged();
     void getObjectsListsAllOrTheIdsGiven();
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
@@ -566,6 +567,59 @@ void tst_Store::damagedLibraryMemberIsLeftOutAndNamed()
     const auto allResponse = std::dynamic_pointer_cast<GetMarloObjectsResponse>(all.response);
     QVERIFY(allResponse && allResponse->objects().size() == 1);
     check(allResponse->objects()[0], allResponse->problems());
+}
+
+void tst_Store::contentOfAnotherTypeIsDamaged()
+{
+    TempStore store;
+    const std::string type = QCJobTemplate::typeId();
+    const std::string samples = folderIdOf(store.run(std::make_shared<CreateFolder>(type, "", "Samples")));
+    auto jobTemplate = makeTemplate("Door Panel");
+    QVERIFY(store.save(jobTemplate, &samples));
+    auto standard = std::make_shared<Standard>();
+    standard->setName("Signal Red");
+    auto library = std::make_shared<ColorStandardsLibrary>();
+    library->setName("Interior");
+    library->setStandards({standard});
+    QVERIFY(store.save(standard));
+    QVERIFY(store.save(library));
+    {
+        // A standard's bytes under the template's row, and a library whose
+        // member's row says template.
+        RawConnection raw(store.path());
+        QVERIFY(raw.exec(QStringLiteral("UPDATE objects SET data = (SELECT data FROM objects WHERE id = ?) WHERE id = ?"),
+                         {QString::fromStdString(standard->id()), QString::fromStdString(jobTemplate->id())}));
+        QVERIFY(raw.exec(QStringLiteral("UPDATE objects SET data = ? WHERE id = ?"),
+                         {ObjectCodec::serialize(*jobTemplate), QString::fromStdString(standard->id())}));
+        QVERIFY(raw.exec(QStringLiteral("UPDATE objects SET type = ? WHERE id = ?"),
+                         {QString::fromStdString(type), QString::fromStdString(standard->id())}));
+    }
+
+    auto getOne = std::make_shared<GetMarloObject>();
+    getOne->setType(type);
+    getOne->setId(jobTemplate->id());
+    const auto one = store.run(getOne);
+    QVERIFY(!one.response);
+    QVERIFY(one.error);
+    QVERIFY2(one.error->message().contains(QStringLiteral("damaged")), qPrintable(one.error->message()));
+    QVERIFY2(one.error->message().contains(QStringLiteral("\"Door Panel\" in the folder \"Samples\"")),
+             qPrintable(one.error->message()));
+
+    auto getAll = std::make_shared<GetMarloObjects>();
+    getAll->setType(type);
+    const auto all = store.run(getAll);
+    const auto allResponse = std::dynamic_pointer_cast<GetMarloObjectsResponse>(all.response);
+    QVERIFY(allResponse);
+    // The standard now stored as a template holds a template: it reads as one.
+    QCOMPARE(allResponse->objects().size(), size_t(1));
+    QCOMPARE(allResponse->objects()[0]->objectTypeId(), type);
+    QCOMPARE(allResponse->problems().size(), 1);
+    QVERIFY2(allResponse->problems()[0].contains(QStringLiteral("\"Door Panel\"")), qPrintable(allResponse->problems()[0]));
+
+    const auto deep = std::dynamic_pointer_cast<ColorStandardsLibrary>(
+        store.fetch(ColorStandardsLibrary::typeId(), library->id(), 2));
+    QVERIFY(deep);
+    QVERIFY(deep->standards().empty());
 }
 
 void tst_Store::getObjectsListsAllOrTheIdsGiven()
