@@ -2,9 +2,11 @@
 
 #include "host/store/StoreError.h"
 
+#include <QFileInfo>
 #include <QSqlDatabase>
 #include <QSqlError>
 #include <QStringList>
+#include <QUrl>
 
 #include <atomic>
 
@@ -45,15 +47,43 @@ QString uniqueConnectionName()
     return QStringLiteral("vemi-store-%1").arg(++counter);
 }
 
+// SQLite's primary result codes that this file tells apart.
+enum SqliteCode {
+    kReadOnly = 8,
+    kIoError = 10,
+    kFull = 13,
+    kCantOpen = 14,
+};
+
+int primaryCode(int code)
+{
+    return code & 0xFF;
+}
+
 QString primaryCause(int code)
 {
-    switch (code & 0xFF) {
+    switch (primaryCode(code)) {
     case 5: return QStringLiteral("the store is locked by another program");
-    case 8: return QStringLiteral("database is read-only");
-    case 13: return QStringLiteral("the disk is full");
-    case 14: return QStringLiteral("the file cannot be opened");
+    case kReadOnly: return QStringLiteral("database is read-only");
+    case kFull: return QStringLiteral("the disk is full");
+    case kCantOpen: return QStringLiteral("the file cannot be opened");
     case 26: return QStringLiteral("the file is not a store");
     default: return {};
+    }
+}
+
+// Failures of SQLite to make or grow its side files (-wal, -shm) beside the
+// store: a read-only open can do without them.
+bool isSideFileFailure(int code)
+{
+    switch (primaryCode(code)) {
+    case kReadOnly:
+    case kIoError:
+    case kFull:
+    case kCantOpen:
+        return true;
+    default:
+        return false;
     }
 }
 
@@ -81,23 +111,74 @@ int StoreDatabase::schemaVersion()
 
 void StoreDatabase::open()
 {
-    QSqlDatabase database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_connectionName);
-    if (!database.isValid())
-        throw StoreError("the SQLite driver for Qt is not installed (package libqt5sql5-sqlite)");
-    database.setDatabaseName(m_path);
-    QString connectOptions = QStringLiteral("QSQLITE_BUSY_TIMEOUT=%1").arg(m_options.busyTimeoutMs);
-    if (m_options.readOnly)
-        connectOptions += QStringLiteral(";QSQLITE_OPEN_READONLY");
-    database.setConnectOptions(connectOptions);
     try {
-        if (!database.open())
-            throw StoreError(describe(database.lastError()).toStdString());
-        checkOwnership();
-        applyPragmas();
+        if (m_options.readOnly)
+            openReadOnly();
+        else
+            connect(Access::ReadWrite);
     } catch (const StoreError& error) {
-        throw StoreError(std::string("Cannot open the store: ") + error.what());
+        throw StoreError(std::string("Cannot open the store: ") + error.what(), error.sqliteCode());
     }
     m_open = true;
+}
+
+void StoreDatabase::connect(Access access)
+{
+    QSqlDatabase database = QSqlDatabase::database(m_connectionName, false);
+    if (!database.isValid())
+        database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_connectionName);
+    if (!database.isValid())
+        throw StoreError("the SQLite driver for Qt is not installed (package libqt5sql5-sqlite)");
+    database.close();
+    QString connectOptions = QStringLiteral("QSQLITE_BUSY_TIMEOUT=%1").arg(m_options.busyTimeoutMs);
+    if (access == Access::ReadWrite) {
+        database.setDatabaseName(m_path);
+    } else {
+        connectOptions += QStringLiteral(";QSQLITE_OPEN_READONLY;QSQLITE_OPEN_URI");
+        QUrl uri = QUrl::fromLocalFile(QFileInfo(m_path).absoluteFilePath());
+        uri.setQuery(access == Access::Immutable ? QStringLiteral("immutable=1") : QStringLiteral("mode=ro"));
+        database.setDatabaseName(uri.toString(QUrl::FullyEncoded));
+    }
+    database.setConnectOptions(connectOptions);
+    if (!database.open()) {
+        const QSqlError error = database.lastError();
+        throw StoreError(describe(error).toStdString(), error.nativeErrorCode().toInt());
+    }
+    checkOwnership();
+    applyPragmas();
+}
+
+// SQLite reads a WAL store through two side files, which even a reader
+// creates; where they cannot be made (a read-only folder or mount, a full
+// disk) the file is opened as immutable instead: read without locks or side
+// files. That is safe only while nobody writes it: when no -wal file shows a
+// writer or changes not yet merged into the file, and either nobody may write
+// the folder or SQLite could not make its side files there either.
+void StoreDatabase::openReadOnly()
+{
+    const std::string file = m_path.toStdString();
+    const QFileInfo info(m_path);
+    if (!info.exists())
+        throw StoreError("there is no store file: " + file);
+    const QFileInfo folder(info.absolutePath());
+    const bool anyoneMayWrite =
+        folder.permissions() & (QFileDevice::WriteOwner | QFileDevice::WriteGroup | QFileDevice::WriteOther);
+    const bool writable = folder.isWritable() && anyoneMayWrite;
+    if (!writable && !QFileInfo::exists(m_path + QStringLiteral("-wal"))) {
+        connect(Access::Immutable);
+        return;
+    }
+    try {
+        connect(Access::ReadOnly);
+    } catch (const StoreError& error) {
+        if (!isSideFileFailure(error.sqliteCode()))
+            throw;
+        if (QFileInfo(m_path + QStringLiteral("-wal")).size() > 0)
+            throw StoreError(std::string(error.what())
+                             + " (the store holds changes not yet merged into the file, which cannot be read"
+                               " without writing beside it: open it once with write access)");
+        connect(Access::Immutable);
+    }
 }
 
 int StoreDatabase::readPragma(const char* name)
@@ -153,12 +234,15 @@ QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings)
 {
     QSqlQuery query(QSqlDatabase::database(m_connectionName, false));
     query.setForwardOnly(true);
+    const auto fail = [this](const QSqlError& error) {
+        return StoreError(describe(error).toStdString(), error.nativeErrorCode().toInt());
+    };
     if (!query.prepare(sql))
-        throw StoreError(describe(query.lastError()).toStdString());
+        throw fail(query.lastError());
     for (const QVariant& value : bindings)
         query.addBindValue(value);
     if (!query.exec())
-        throw StoreError(describe(query.lastError()).toStdString());
+        throw fail(query.lastError());
     return query;
 }
 

@@ -31,7 +31,9 @@ public:
     static int schemaVersion();
 
     // Opens the file, refuses one that is not a store, creates or migrates the
-    // schema. Nothing is written to a file that fails the checks.
+    // schema. Nothing is written to a file that fails the checks. A read-only
+    // open never writes the file and works where SQLite cannot make its side
+    // files (-wal, -shm): in a folder nobody may write, on a read-only mount.
     void open();
 
     // Runs one statement with positional bindings, positioned before its first
@@ -46,6 +48,10 @@ public:
     QString describe(const QSqlError& error) const;
 
 private:
+    enum class Access { ReadWrite, ReadOnly, Immutable };
+    // Opens the connection and runs the checks; throws StoreError.
+    void connect(Access access);
+    void openReadOnly();
     void checkOwnership();
     void migrate();
     void applyPragmas();

@@ -29,9 +29,15 @@
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
 
+#include <QDateTime>
+#include <QDir>
 #include <QFile>
+#include <QFileInfo>
+#include <QScopeGuard>
 #include <QThread>
 #include <QtTest>
+
+#include <unistd.h>
 
 using namespace vemi;
 
@@ -173,6 +179,8 @@ private slots:
     void damagedLibraryMemberIsLeftOutAndNamed_data();
     void damagedLibraryMemberIsLeftOutAndNamed();
     void contentOfAnotherTypeIsDamaged();
+    void readOnlyOpenInFolderNobodyMayWrite();
+    void readOnlyOpenSeesChangesNotYetMerged();
     void getObjectsListsAllOrTheIdsGiven();
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
@@ -620,6 +628,77 @@ void tst_Store::contentOfAnotherTypeIsDamaged()
         store.fetch(ColorStandardsLibrary::typeId(), library->id(), 2));
     QVERIFY(deep);
     QVERIFY(deep->standards().empty());
+}
+
+void tst_Store::readOnlyOpenInFolderNobodyMayWrite()
+{
+    // SQLite makes -wal and -shm files beside a WAL store even to read it; a
+    // read-only open must do without them where the folder cannot be written.
+    QTemporaryDir sourceFolder;
+    const QString source = sourceFolder.filePath(QStringLiteral("store.sqlite"));
+    auto kept = makeTemplate("Kept");
+    {
+        TempStore writer;
+        QVERIFY(writer.save(kept));
+        writer.reopen(StoreOptions{true});
+        // The writer closed cleanly, so the file alone holds everything.
+        QVERIFY(QFile::copy(writer.path(), source));
+    }
+    QTemporaryDir folder;
+    const QString path = folder.filePath(QStringLiteral("store.sqlite"));
+    QVERIFY(QFile::copy(source, path));
+    QVERIFY(QFile::setPermissions(path, QFileDevice::ReadOwner | QFileDevice::ReadGroup | QFileDevice::ReadOther));
+    const QFileDevice::Permissions readAndList = QFileDevice::ReadOwner | QFileDevice::ExeOwner
+                                                 | QFileDevice::ReadGroup | QFileDevice::ExeGroup
+                                                 | QFileDevice::ReadOther | QFileDevice::ExeOther;
+    QVERIFY(QFile::setPermissions(folder.path(), readAndList));
+    const auto restore = qScopeGuard([&] {
+        QFile::setPermissions(folder.path(), readAndList | QFileDevice::WriteOwner);
+    });
+    // Root may write the folder all the same (chmod does not stop it), so
+    // there the proof is that the file and the folder stay as they were,
+    // which the checks below hold in either case.
+    if (::geteuid() != 0)
+        QVERIFY(!QFileInfo(folder.path()).isWritable());
+    QFile file(path);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    const QByteArray bytes = file.readAll();
+    file.close();
+    const QDateTime modified = QFileInfo(path).lastModified();
+    const QStringList listing = QDir(folder.path()).entryList(QDir::Files | QDir::Hidden);
+    QCOMPARE(listing, QStringList({"store.sqlite"}));
+
+    {
+        MarloModel model(path, StoreOptions{true});
+        const QString error = model.open();
+        QVERIFY2(error.isEmpty(), qPrintable(error));
+        QCOMPARE(QDir(folder.path()).entryList(QDir::Files | QDir::Hidden), listing);
+    }
+    QCOMPARE(QDir(folder.path()).entryList(QDir::Files | QDir::Hidden), listing);
+    QVERIFY(file.open(QIODevice::ReadOnly));
+    QCOMPARE(file.readAll(), bytes);
+    QCOMPARE(QFileInfo(path).lastModified(), modified);
+}
+
+void tst_Store::readOnlyOpenSeesChangesNotYetMerged()
+{
+    // Another program holds the store open with a change in its -wal file; a
+    // read-only open that skipped the -wal file would still see the object.
+    TempStore store;
+    auto kept = makeTemplate("Kept");
+    auto removed = makeTemplate("Removed");
+    QVERIFY(store.save(kept));
+    QVERIFY(store.save(removed));
+    RawConnection other(store.path());
+    QVERIFY(other.exec(QStringLiteral("DELETE FROM objects WHERE id = ?"), {QString::fromStdString(removed->id())}));
+    store.reopen(StoreOptions{true});
+    QVERIFY(QFileInfo(store.path() + QStringLiteral("-wal")).size() > 0);
+
+    auto get = std::make_shared<GetMarloObjects>();
+    get->setType(QCJobTemplate::typeId());
+    const auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(get).response);
+    QVERIFY(response);
+    QCOMPARE(namesOf(response->objects()), QStringList({"Kept"}));
 }
 
 void tst_Store::getObjectsListsAllOrTheIdsGiven()
