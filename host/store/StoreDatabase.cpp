@@ -5,6 +5,7 @@
 #include <QFileInfo>
 #include <QSqlDatabase>
 #include <QSqlError>
+#include <QStorageInfo>
 #include <QStringList>
 #include <QUrl>
 
@@ -49,27 +50,19 @@ QString uniqueConnectionName()
 
 // SQLite's primary result codes that this file tells apart.
 enum SqliteCode {
+    kBusy = 5,
+    kLocked = 6,
     kReadOnly = 8,
     kIoError = 10,
+    kCorrupt = 11,
     kFull = 13,
     kCantOpen = 14,
+    kNotADatabase = 26,
 };
 
 int primaryCode(int code)
 {
     return code & 0xFF;
-}
-
-QString primaryCause(int code)
-{
-    switch (primaryCode(code)) {
-    case 5: return QStringLiteral("the store is locked by another program");
-    case kReadOnly: return QStringLiteral("database is read-only");
-    case kFull: return QStringLiteral("the disk is full");
-    case kCantOpen: return QStringLiteral("the file cannot be opened");
-    case 26: return QStringLiteral("the file is not a store");
-    default: return {};
-    }
 }
 
 // Failures of SQLite to make or grow its side files (-wal, -shm) beside the
@@ -86,6 +79,10 @@ bool isSideFileFailure(int code)
         return false;
     }
 }
+
+// No disk has exactly nothing left when it is "full" for a program: the
+// file system keeps a little back, so a few blocks count as full.
+constexpr qint64 kFullDiskBytes = 64 * 1024;
 
 } // namespace
 
@@ -181,6 +178,12 @@ void StoreDatabase::openReadOnly()
     }
 }
 
+bool StoreDatabase::diskFull() const
+{
+    const QStorageInfo storage(QFileInfo(m_path).absolutePath());
+    return storage.isValid() && storage.bytesAvailable() < kFullDiskBytes;
+}
+
 int StoreDatabase::readPragma(const char* name)
 {
     return scalar(QStringLiteral("PRAGMA %1").arg(QLatin1String(name)), {}).toInt();
@@ -193,10 +196,14 @@ void StoreDatabase::checkOwnership()
     const std::string file = m_path.toStdString();
     const int applicationId = readPragma("application_id");
     const int version = readPragma("user_version");
-    const bool fresh = applicationId == 0 && version == 0
-                       && scalar(QStringLiteral("SELECT count(*) FROM sqlite_master")).toInt() == 0;
+    const bool empty = scalar(QStringLiteral("SELECT count(*) FROM sqlite_master")).toInt() == 0;
+    const bool fresh = applicationId == 0 && version == 0 && empty;
     if (!fresh && applicationId != kApplicationId)
         throw StoreError("the file is another program's SQLite database, not a store: " + file);
+    // Creating the schema over tables that are there already would fail on
+    // the first of them, with a message about SQL that helps nobody.
+    if (version == 0 && !empty)
+        throw StoreError("the file is damaged or not a store (it has tables but no schema version): " + file);
     if (version > schemaVersion())
         throw StoreError("it was written by a newer version (schema " + std::to_string(version)
                          + ", this program knows " + std::to_string(schemaVersion()) + "): " + file);
@@ -267,10 +274,40 @@ void StoreDatabase::writeTransaction(const std::function<void()>& body)
 
 QString StoreDatabase::describe(const QSqlError& error) const
 {
-    const QString cause = primaryCause(error.nativeErrorCode().toInt());
+    const int code = error.nativeErrorCode().toInt();
+    const int primary = primaryCode(code);
+    const bool full = (primary == kIoError || primary == kFull || primary == kCantOpen) && diskFull();
+    const QString cause = explain(code, full);
     const QString detail = error.databaseText().isEmpty() ? error.text() : error.databaseText();
     const QString message = cause.isEmpty() ? detail : cause + QStringLiteral(" (") + detail + QLatin1Char(')');
     return message + QStringLiteral(": ") + m_path;
+}
+
+QString StoreDatabase::explain(int sqliteCode, bool diskFull)
+{
+    switch (primaryCode(sqliteCode)) {
+    case kBusy:
+    case kLocked:
+        return QStringLiteral("the store is locked by another program");
+    case kReadOnly:
+        return QStringLiteral("database is read-only");
+    case kIoError:
+        return diskFull ? QStringLiteral("the disk is full")
+                        : QStringLiteral("the disk cannot be read or written (it may be full, or the folder may"
+                                         " not be writable)");
+    case kCorrupt:
+        return QStringLiteral("the file is damaged");
+    case kFull:
+        return QStringLiteral("the disk is full");
+    case kCantOpen:
+        return diskFull ? QStringLiteral("the disk is full")
+                        : QStringLiteral("the file cannot be opened (it may be missing, or its folder may not be"
+                                         " writable)");
+    case kNotADatabase:
+        return QStringLiteral("the file is not a store");
+    default:
+        return {};
+    }
 }
 
 } // namespace vemi

@@ -181,6 +181,8 @@ private slots:
     void contentOfAnotherTypeIsDamaged();
     void readOnlyOpenInFolderNobodyMayWrite();
     void readOnlyOpenSeesChangesNotYetMerged();
+    void explainsSqliteFailures_data();
+    void explainsSqliteFailures();
     void getObjectsListsAllOrTheIdsGiven();
     void folderTreeOperations();
     void folderCannotMoveIntoItself();
@@ -328,6 +330,7 @@ void tst_Store::refusesFilesThatAreNotStores_data()
     QTest::newRow("a text file") << "text" << "not a store";
     QTest::newRow("another program's SQLite database") << "foreign" << "another program";
     QTest::newRow("a store from a newer version") << "newer" << "newer version";
+    QTest::newRow("a store whose schema version was lost") << "unversioned" << "damaged or not a store";
 }
 
 void tst_Store::refusesFilesThatAreNotStores()
@@ -340,6 +343,10 @@ void tst_Store::refusesFilesThatAreNotStores()
         QFile file(path);
         QVERIFY(file.open(QIODevice::WriteOnly));
         file.write(QByteArray("These are the minutes of the last meeting, not a database.\n").repeated(100));
+    } else if (setup == QLatin1String("unversioned")) {
+        QVERIFY(MarloModel(path).open().isEmpty());
+        RawConnection raw(path);
+        QVERIFY(raw.exec(QStringLiteral("PRAGMA user_version = 0")));
     } else {
         RawConnection raw(path);
         if (setup == QLatin1String("foreign")) {
@@ -699,6 +706,38 @@ void tst_Store::readOnlyOpenSeesChangesNotYetMerged()
     const auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(get).response);
     QVERIFY(response);
     QCOMPARE(namesOf(response->objects()), QStringList({"Kept"}));
+}
+
+void tst_Store::explainsSqliteFailures_data()
+{
+    QTest::addColumn<int>("code");
+    QTest::addColumn<bool>("diskFull");
+    QTest::addColumn<QString>("expected");
+    // Extended codes: SQLITE_IOERR_SHMSIZE is what a WAL store gives at open
+    // when there is no room for its -shm file.
+    const int ioErrShmSize = 10 | (19 << 8);
+    QTest::newRow("disk I/O error on a full disk") << ioErrShmSize << true << "the disk is full";
+    QTest::newRow("disk I/O error with room left") << ioErrShmSize << false << "folder may not be writable";
+    QTest::newRow("disk full while writing") << 13 << false << "the disk is full";
+    QTest::newRow("file that cannot be opened") << 14 << false << "cannot be opened";
+    QTest::newRow("file that cannot be opened on a full disk") << 14 << true << "the disk is full";
+    QTest::newRow("read-only file") << (8 | (3 << 8)) << false << "read-only";
+    QTest::newRow("store locked by another program") << 5 << false << "locked";
+    QTest::newRow("file that is not a database") << 26 << false << "not a store";
+    QTest::newRow("damaged file") << 11 << false << "damaged";
+    QTest::newRow("any other failure keeps SQLite's words") << 1 << false << "";
+}
+
+void tst_Store::explainsSqliteFailures()
+{
+    QFETCH(int, code);
+    QFETCH(bool, diskFull);
+    QFETCH(QString, expected);
+    const QString explained = StoreDatabase::explain(code, diskFull);
+    if (expected.isEmpty())
+        QCOMPARE(explained, QString());
+    else
+        QVERIFY2(explained.contains(expected), qPrintable(explained));
 }
 
 void tst_Store::getObjectsListsAllOrTheIdsGiven()
