@@ -30,7 +30,16 @@ std::vector<std::string> BaseObject::referencedIds() const
     return {};
 }
 
+std::string BaseObject::referencedTypeId() const
+{
+    return {};
+}
+
 void BaseObject::resolveReferences(const ObjectLookup&)
+{
+}
+
+void BaseObject::dropReferences(const std::vector<std::string>&)
 {
 }
 

@@ -41,9 +41,13 @@ public:
     // members of a library). Such members are stored as ids and decoded as
     // stand-ins that carry only their id, until resolveReferences replaces them.
     virtual std::vector<std::string> referencedIds() const;
+    // The type id of the objects that referencedIds() names; empty when there are none.
+    virtual std::string referencedTypeId() const;
     using ObjectLookup = std::function<std::shared_ptr<BaseObject>(const std::string& id)>;
     // Replaces each stand-in by lookup(id); a stand-in whose lookup is empty stays.
     virtual void resolveReferences(const ObjectLookup& lookup);
+    // Removes the members with these ids, e.g. those deleted since the object was stored.
+    virtual void dropReferences(const std::vector<std::string>& ids);
 
 private:
     std::string m_id;

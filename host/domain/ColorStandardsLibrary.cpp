@@ -3,6 +3,8 @@
 #include "host/domain/ObjectCodec.h"
 #include "host/domain/Standard.h"
 
+#include <algorithm>
+
 namespace vemi {
 
 const std::string& ColorStandardsLibrary::typeId()
@@ -49,6 +51,11 @@ std::vector<std::string> ColorStandardsLibrary::referencedIds() const
     return ids;
 }
 
+std::string ColorStandardsLibrary::referencedTypeId() const
+{
+    return Standard::typeId();
+}
+
 void ColorStandardsLibrary::resolveReferences(const ObjectLookup& lookup)
 {
     for (auto& standard : m_standards) {
@@ -57,6 +64,14 @@ void ColorStandardsLibrary::resolveReferences(const ObjectLookup& lookup)
         if (auto found = std::dynamic_pointer_cast<Standard>(lookup(standard->id())))
             standard = found;
     }
+}
+
+void ColorStandardsLibrary::dropReferences(const std::vector<std::string>& ids)
+{
+    const auto dropped = [&ids](const std::shared_ptr<Standard>& member) {
+        return member && std::find(ids.begin(), ids.end(), member->id()) != ids.end();
+    };
+    m_standards.erase(std::remove_if(m_standards.begin(), m_standards.end(), dropped), m_standards.end());
 }
 
 } // namespace vemi

@@ -3,6 +3,8 @@
 #include "host/domain/ObjectCodec.h"
 #include "host/domain/TagDefinition.h"
 
+#include <algorithm>
+
 namespace vemi {
 
 const std::string& PropertyLibrary::typeId()
@@ -49,6 +51,11 @@ std::vector<std::string> PropertyLibrary::referencedIds() const
     return ids;
 }
 
+std::string PropertyLibrary::referencedTypeId() const
+{
+    return TagDefinition::typeId();
+}
+
 void PropertyLibrary::resolveReferences(const ObjectLookup& lookup)
 {
     for (auto& property : m_properties) {
@@ -57,6 +64,14 @@ void PropertyLibrary::resolveReferences(const ObjectLookup& lookup)
         if (auto found = std::dynamic_pointer_cast<TagDefinition>(lookup(property->id())))
             property = found;
     }
+}
+
+void PropertyLibrary::dropReferences(const std::vector<std::string>& ids)
+{
+    const auto dropped = [&ids](const std::shared_ptr<TagDefinition>& member) {
+        return member && std::find(ids.begin(), ids.end(), member->id()) != ids.end();
+    };
+    m_properties.erase(std::remove_if(m_properties.begin(), m_properties.end(), dropped), m_properties.end());
 }
 
 } // namespace vemi

@@ -24,7 +24,9 @@ public:
     void writeFields(QCborMap& map) const override;
     void readFields(const QCborMap& map) override;
     std::vector<std::string> referencedIds() const override;
+    std::string referencedTypeId() const override;
     void resolveReferences(const ObjectLookup& lookup) override;
+    void dropReferences(const std::vector<std::string>& ids) override;
 
 private:
     std::vector<std::shared_ptr<TagDefinition>> m_properties;

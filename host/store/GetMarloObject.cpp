@@ -1,5 +1,6 @@
 #include "host/store/GetMarloObject.h"
 
+#include "host/domain/BaseObject.h"
 #include "host/store/GetMarloObjectResponse.h"
 #include "host/store/StoredObjectReader.h"
 
@@ -7,7 +8,9 @@ namespace vemi {
 
 std::shared_ptr<Response> GetMarloObject::execute(StoreDatabase& database)
 {
-    return std::make_shared<GetMarloObjectResponse>(StoredObjectReader(database).read(m_id, m_type, m_depth));
+    StoredObjectReader reader(database);
+    auto object = reader.read(m_id, m_type, m_depth);
+    return std::make_shared<GetMarloObjectResponse>(std::move(object), reader.problems());
 }
 
 std::string GetMarloObject::description() const

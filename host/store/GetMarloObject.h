@@ -4,7 +4,9 @@
 
 namespace vemi {
 
-// Fetches one object by type and id; depth 2 also fetches the objects it refers to.
+// Fetches one object by type and id; depth 2 also fetches the objects it refers
+// to. A damaged object fails the command; members that no longer exist are
+// left out, damaged members too and are named in the answer's problems().
 class GetMarloObject : public Command
 {
 public:

@@ -9,13 +9,17 @@ namespace vemi {
 std::shared_ptr<Response> GetMarloObjects::execute(StoreDatabase& database)
 {
     StoredObjectReader reader(database);
-    if (m_ids.empty())
-        return std::make_shared<GetMarloObjectsResponse>(reader.readAll(m_type, m_depth));
     std::vector<std::shared_ptr<BaseObject>> objects;
-    objects.reserve(m_ids.size());
-    for (const std::string& id : m_ids)
-        objects.push_back(reader.read(id, m_type, m_depth));
-    return std::make_shared<GetMarloObjectsResponse>(std::move(objects));
+    if (m_ids.empty()) {
+        objects = reader.readAll(m_type, m_depth);
+    } else {
+        objects.reserve(m_ids.size());
+        for (const std::string& id : m_ids) {
+            if (auto object = reader.readIntact(id, m_type, m_depth))
+                objects.push_back(std::move(object));
+        }
+    }
+    return std::make_shared<GetMarloObjectsResponse>(std::move(objects), reader.problems());
 }
 
 std::string GetMarloObjects::description() const

@@ -7,7 +7,9 @@
 namespace vemi {
 
 // Fetches objects of one type: those with the given ids, in that order, or
-// every object of the type (by name) when no ids are set.
+// every object of the type (by name) when no ids are set. A missing id or one
+// of another type fails the command; damaged objects are left out of the
+// answer and named in its problems().
 class GetMarloObjects : public Command
 {
 public:

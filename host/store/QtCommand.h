@@ -26,12 +26,18 @@ public:
     std::shared_ptr<Command> command() const { return m_command; }
 
     // Thread-safe: queue the answer for delivery on the wrapper's thread. They
-    // take the caller's handle, so that the wrapper (a QObject) is released on
-    // its own thread, never on the worker's.
+    // take the caller's handle into the posted event, which is deleted on the
+    // wrapper's thread after delivery, so that the wrapper (a QObject) is
+    // released there, never on the worker's; the caller must not touch the
+    // wrapper afterwards.
     static void deliverResponse(std::shared_ptr<QtCommand> command, std::shared_ptr<Response> response);
     static void deliverError(std::shared_ptr<QtCommand> command, std::shared_ptr<ErrorInfo> error);
-    // Thread-safe, for a command that is still running.
+    // Thread-safe, for a command that is still running; the caller must hold
+    // a handle of its own.
     void postProgress(std::shared_ptr<Progress> progress);
+
+protected:
+    bool event(QEvent* event) override;
 
 signals:
     void responseReceived(std::shared_ptr<vemi::Response> response);
@@ -39,6 +45,9 @@ signals:
     void progressReceived(std::shared_ptr<vemi::Progress> progress);
 
 private:
+    class AnswerEvent;
+    static void post(std::unique_ptr<AnswerEvent> answer);
+
     std::shared_ptr<Command> m_command;
 };
 

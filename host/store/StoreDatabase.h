@@ -31,7 +31,9 @@ public:
     static int schemaVersion();
 
     // Opens the file, refuses one that is not a store, creates or migrates the
-    // schema. Nothing is written to a file that fails the checks.
+    // schema. Nothing is written to a file that fails the checks. A read-only
+    // open never writes the file and works in a folder nobody may write and
+    // on a full disk, where SQLite cannot make its side files (-wal, -shm).
     void open();
 
     // Runs one statement with positional bindings, positioned before its first
@@ -44,8 +46,17 @@ public:
     void writeTransaction(const std::function<void()>& body);
 
     QString describe(const QSqlError& error) const;
+    // What a failed SQLite call means, in words a person can act on; empty
+    // when SQLite's own text says it best. diskFull: the store's disk has no
+    // room left, which turns SQLite's "disk I/O error" into plain words.
+    static QString explain(int sqliteCode, bool diskFull);
 
 private:
+    enum class Access { ReadWrite, ReadOnly, Immutable };
+    // Opens the connection and runs the checks; throws StoreError.
+    void connect(Access access);
+    void openReadOnly();
+    bool diskFull() const;
     void checkOwnership();
     void migrate();
     void applyPragmas();
