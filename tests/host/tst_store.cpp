@@ -265,6 +265,7 @@ void tst_Store::updateTakesSnapshotAtDispatch()
     connect(wrapper.get(), &QtCommand::responseReceived, &loop, &QEventLoop::quit);
     store.model().commandDispatcher("")->dispatch(wrapper);
     jobTemplate->setName("Edited after dispatch");
+    QTimer::singleShot(20000, &loop, &QEventLoop::quit);
     loop.exec();
 
     const auto stored = std::dynamic_pointer_cast<QCJobTemplate>(store.fetch(QCJobTemplate::typeId(), jobTemplate->id()));
