@@ -7,6 +7,7 @@
 
 #include <QCloseEvent>
 #include <QFile>
+#include <QShortcut>
 #include <QStackedWidget>
 #include <QTabWidget>
 #include <QToolBar>
@@ -23,6 +24,9 @@ ShellWindow::ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Cli
     for (const PluginCatalog::Client& client : clients)
         addClient(store, client.client);
     connect(m_tabs, &QTabWidget::currentChanged, this, &ShellWindow::onCurrentTabChanged);
+    // The top bars are not the window's own menu bar, which F10 would open.
+    auto* menuKey = new QShortcut(QKeySequence(Qt::Key_F10), this);
+    connect(menuKey, &QShortcut::activated, this, &ShellWindow::openFirstMenu);
     onCurrentTabChanged(m_tabs->currentIndex());
 }
 
@@ -83,6 +87,13 @@ void ShellWindow::onCurrentTabChanged(int tab)
         toolBar(tab)->show();
         current->receivedFocus(true);
     }
+}
+
+void ShellWindow::openFirstMenu()
+{
+    CorvoTopBar* bar = topBar(m_currentTab);
+    if (bar && !bar->actions().isEmpty())
+        bar->setActiveAction(bar->actions().first());
 }
 
 void ShellWindow::closeEvent(QCloseEvent* event)

@@ -36,6 +36,8 @@ protected:
 private:
     void addClient(MarloModel& store, ClientInterface* client);
     void onCurrentTabChanged(int tab);
+    // Opens the first menu of the current tab's top bar, as F10 does in a menu bar.
+    void openFirstMenu();
     static QString styleSheet(const QString& name);
 
     QTabWidget* m_tabs;

@@ -26,13 +26,15 @@ void PellamAppWidget::createContent()
     layout->addWidget(m_browser);
     layout->setContentsMargins(0, 0, 0, 0);
     setLayout(layout);
+    // F2 and Del act on the browser's selection wherever the focus is in the tab.
+    m_browser->setShortcutScope(this);
 }
 
 void PellamAppWidget::addMenus(CorvoTopBar* topBar)
 {
     if (!m_browser)
         return;
-    auto* menu = new QMenu(tr("File"));
+    auto* menu = new QMenu(tr("&File"));
     m_browser->createCustomMenus(menu);
     menu->addSeparator();
     QAction* refreshAction = menu->addAction(tr("&Refresh"));

@@ -84,6 +84,11 @@ void PellamWidget::createCustomMenus(QMenu* menu)
     m_browser->createCustomMenus(menu, tr("Job Template"), tr("Job Templates"), true);
 }
 
+void PellamWidget::setShortcutScope(QWidget* scope)
+{
+    m_browser->setShortcutScope(scope);
+}
+
 void PellamWidget::addBrowserActions(QWidget* bar)
 {
     m_browser->actionNew()->setIcon(QIcon(QStringLiteral(":Images/NewTemplate.png")));

@@ -38,6 +38,8 @@ public:
     std::string namedObjectTypeId() override;
 
     void createCustomMenus(QMenu* menu);
+    // The browser's keys (F2, Del) work while the focus is anywhere inside scope.
+    void setShortcutScope(QWidget* scope);
     // Gives new, open and save their icons and adds them to bar in that order.
     void addBrowserActions(QWidget* bar);
     bool mayClose();

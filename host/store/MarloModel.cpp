@@ -53,6 +53,18 @@ void MarloModel::setCommandDispatcher(const std::string& dispatcherId, std::shar
     m_dispatchers[normalised(dispatcherId)] = std::move(dispatcher);
 }
 
+bool MarloModel::isWritable(const std::string& dispatcherId) const
+{
+    if (m_options.readOnly)
+        return false;
+    const auto store = std::dynamic_pointer_cast<StoreDispatcher>(commandDispatcher(dispatcherId));
+    if (!store)
+        return commandDispatcher(dispatcherId) != nullptr;
+    const QFileInfo file(store->path());
+    const QFileInfo folder(file.absolutePath());
+    return folder.isWritable() && (!file.exists() || file.isWritable());
+}
+
 std::string MarloModel::normalised(const std::string& dispatcherId)
 {
     return dispatcherId.empty() ? defaultDispatcherId() : dispatcherId;

@@ -36,6 +36,10 @@ public:
     void setCommandDispatcher(const std::string& dispatcherId, std::shared_ptr<CommandDispatcher> dispatcher);
 
     QString defaultStorePath() const { return m_defaultStorePath; }
+    // Whether the store of the id can take writes: false when the stores were
+    // opened read-only, or its file or the file's folder (which holds the
+    // journal) may not be written by this user.
+    bool isWritable(const std::string& dispatcherId = std::string()) const;
 
 private:
     static std::string normalised(const std::string& dispatcherId);

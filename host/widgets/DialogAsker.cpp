@@ -1,16 +1,19 @@
 #include "host/widgets/DialogAsker.h"
 
+#include "host/widgets/NameDialog.h"
+
+#include <QCoreApplication>
 #include <QInputDialog>
 #include <QMessageBox>
+#include <QPushButton>
 
 namespace vemi {
 
 std::optional<QString> DialogAsker::askText(QWidget* parent, const QString& title, const QString& label,
-                                            const QString& suggestion)
+                                            const QString& suggestion, const TextCheck& check)
 {
-    bool ok = false;
-    const QString text = QInputDialog::getText(parent, title, label, QLineEdit::Normal, suggestion, &ok);
-    return ok ? std::optional<QString>(text) : std::nullopt;
+    NameDialog dialog(title, label, suggestion, check, parent);
+    return dialog.exec() == QDialog::Accepted ? std::optional<QString>(dialog.name()) : std::nullopt;
 }
 
 std::optional<int> DialogAsker::askItem(QWidget* parent, const QString& title, const QString& label,
@@ -22,9 +25,15 @@ std::optional<int> DialogAsker::askItem(QWidget* parent, const QString& title, c
     return ok && position >= 0 ? std::optional<int>(position) : std::nullopt;
 }
 
-bool DialogAsker::confirm(QWidget* parent, const QString& title, const QString& question)
+bool DialogAsker::confirm(QWidget* parent, const QString& title, const QString& question,
+                          DefaultAnswer defaultAnswer)
 {
-    return QMessageBox::question(parent, title, question) == QMessageBox::Yes;
+    QMessageBox box(QMessageBox::Question, title, question, QMessageBox::Yes | QMessageBox::No, parent);
+    box.button(QMessageBox::Yes)->setText(QCoreApplication::translate("vemi::DialogAsker", "&Yes"));
+    box.button(QMessageBox::No)->setText(QCoreApplication::translate("vemi::DialogAsker", "&No"));
+    box.setDefaultButton(defaultAnswer == DefaultAnswer::Yes ? QMessageBox::Yes : QMessageBox::No);
+    box.setEscapeButton(QMessageBox::No);
+    return box.exec() == QMessageBox::Yes;
 }
 
 } // namespace vemi

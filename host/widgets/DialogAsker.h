@@ -4,15 +4,17 @@
 
 namespace vemi {
 
-// Asks with Qt's standard modal dialogs (QInputDialog, QMessageBox).
+// Asks with modal dialogs: a NameDialog for texts, Qt's standard dialogs
+// (QInputDialog, QMessageBox) for the rest.
 class DialogAsker : public UserAsker
 {
 public:
     std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
-                                   const QString& suggestion) override;
+                                   const QString& suggestion, const TextCheck& check) override;
     std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
                                const QStringList& items) override;
-    bool confirm(QWidget* parent, const QString& title, const QString& question) override;
+    bool confirm(QWidget* parent, const QString& title, const QString& question,
+                 DefaultAnswer defaultAnswer) override;
 };
 
 } // namespace vemi

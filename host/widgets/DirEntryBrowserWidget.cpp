@@ -6,6 +6,7 @@
 #include "host/widgets/FolderCommands.h"
 #include "host/widgets/ObjectTypeNames.h"
 #include "host/domain/NamedObject.h"
+#include "host/store/MarloModel.h"
 
 #include <QAction>
 #include <QEventLoop>
@@ -14,7 +15,9 @@
 #include <QLabel>
 #include <QMenu>
 #include <QMessageBox>
+#include <QMouseEvent>
 #include <QPointer>
+#include <QPushButton>
 #include <QTreeView>
 #include <QVBoxLayout>
 
@@ -34,6 +37,8 @@ DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
     m_title->setFont(titleFont);
     m_tree->setHeaderHidden(true);
     m_tree->setContextMenuPolicy(Qt::CustomContextMenu);
+    // A press, a move and a release must not sweep a range into the selection.
+    m_tree->viewport()->installEventFilter(this);
     connect(m_tree, &QWidget::customContextMenuRequested, this, &DirEntryBrowserWidget::showContextMenu);
     connect(m_folderCommands, &FolderCommands::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
 
@@ -71,12 +76,30 @@ void DirEntryBrowserWidget::createActions()
     m_actionRename = make(tr("Rename…"), QKeySequence(Qt::Key_F2), &DirEntryBrowserWidget::renameCurrent);
     m_actionMove = make(tr("Move To…"), {}, &DirEntryBrowserWidget::moveSelection);
     m_actionDelete = make(tr("Delete"), QKeySequence::Delete, &DirEntryBrowserWidget::deleteSelection);
-    // The tree's own shortcuts must not fire while the user types elsewhere in the tab.
-    for (QAction* action : {m_actionRename, m_actionDelete}) {
-        action->setShortcutContext(Qt::WidgetShortcut);
-        m_tree->addAction(action);
-    }
+    // Text fields take Del for themselves (ShortcutOverride), so the keys can
+    // work from anywhere inside the scope without eating the user's typing.
+    for (QAction* action : {m_actionRename, m_actionDelete})
+        action->setShortcutContext(Qt::WidgetWithChildrenShortcut);
+    setShortcutScope(this);
     updateActions();
+}
+
+void DirEntryBrowserWidget::setShortcutScope(QWidget* scope)
+{
+    for (QAction* action : {m_actionRename, m_actionDelete}) {
+        if (m_shortcutScope)
+            m_shortcutScope->removeAction(action);
+        scope->addAction(action);
+    }
+    m_shortcutScope = scope;
+}
+
+bool DirEntryBrowserWidget::eventFilter(QObject* watched, QEvent* event)
+{
+    if (watched == m_tree->viewport() && event->type() == QEvent::MouseMove
+        && static_cast<QMouseEvent*>(event)->buttons() != Qt::NoButton)
+        return true;
+    return QWidget::eventFilter(watched, event);
 }
 
 void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowserInterface* callbacks,
@@ -90,7 +113,10 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     if (m_callbacks)
         m_callbacks->setFolderBrowser(this);
     m_plural = title;
-    m_title->setText(title);
+    m_writable = model->store().isWritable(model->dispatcherId());
+    m_title->setText(m_writable ? title : tr("%1 (read-only)").arg(title));
+    m_title->setToolTip(m_writable ? QString() : tr("The store cannot be changed: it was opened read-only "
+                                                     "or its file may not be written."));
     m_actionNew->setText(newText);
     m_selectionMemory.setKey(settingsName, typeId);
 
@@ -110,6 +136,7 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
             return;
         m_tree->expandToDepth(0);
         restoreSelection({remembered});
+        m_tree->setFocus();
     });
 }
 
@@ -240,13 +267,14 @@ void DirEntryBrowserWidget::updateActions()
     const bool ready = m_model != nullptr;
     Node* node = currentNode();
     const QVector<Node*> nodes = selectedNodes();
-    m_actionNew->setEnabled(ready && m_callbacks);
+    const bool editable = ready && m_writable;
+    m_actionNew->setEnabled(editable && m_callbacks);
     m_actionOpen->setEnabled(ready);
     m_actionSave->setEnabled(node && !node->isFolder() && node->isModified() && node->object());
-    m_actionNewFolder->setEnabled(ready);
-    m_actionRename->setEnabled(node != nullptr);
-    m_actionMove->setEnabled(!nodes.isEmpty());
-    m_actionDelete->setEnabled(!nodes.isEmpty());
+    m_actionNewFolder->setEnabled(editable);
+    m_actionRename->setEnabled(editable && node != nullptr);
+    m_actionMove->setEnabled(editable && !nodes.isEmpty());
+    m_actionDelete->setEnabled(editable && !nodes.isEmpty());
 }
 
 void DirEntryBrowserWidget::showError(const QString& message)
@@ -279,7 +307,7 @@ std::vector<std::string> DirEntryBrowserWidget::namesInTargetFolder() const
 
 void DirEntryBrowserWidget::createNewObject()
 {
-    if (!m_model || !m_callbacks)
+    if (!m_model || !m_callbacks || !m_writable)
         return;
     Node* folder = m_model->folderFor(currentNode());
     m_newObjectFolder = folder ? folder->serial() : 0;
@@ -287,6 +315,8 @@ void DirEntryBrowserWidget::createNewObject()
     if (!object)
         return;
     selectNode(m_model->addUnsavedObject(folder, object));
+    // F2 and typing go to the new entry, wherever the user started New from.
+    m_tree->setFocus();
 }
 
 void DirEntryBrowserWidget::openObject()
@@ -375,10 +405,13 @@ bool DirEntryBrowserWidget::mayClose()
     QStringList names;
     for (const Node* node : unsaved)
         names << node->displayName();
-    const auto answer = QMessageBox::question(this, tr("Unsaved changes"),
-                                              unsavedChangesQuestion(m_model->objectType(), names),
-                                              QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel,
-                                              QMessageBox::Save);
+    QMessageBox box(QMessageBox::Question, tr("Unsaved changes"), unsavedChangesQuestion(m_model->objectType(), names),
+                    QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, this);
+    box.button(QMessageBox::Save)->setText(tr("&Save"));
+    box.button(QMessageBox::Discard)->setText(tr("&Discard"));
+    box.button(QMessageBox::Cancel)->setText(tr("&Cancel"));
+    box.setDefaultButton(QMessageBox::Save);
+    const int answer = box.exec();
     if (answer == QMessageBox::Discard)
         return true;
     if (answer != QMessageBox::Save)
@@ -412,12 +445,14 @@ void DirEntryBrowserWidget::refresh()
 
 void DirEntryBrowserWidget::createFolder()
 {
-    m_folderCommands->createFolder(currentNode());
+    if (m_writable)
+        m_folderCommands->createFolder(currentNode());
 }
 
 void DirEntryBrowserWidget::renameCurrent()
 {
-    m_folderCommands->rename(currentNode());
+    if (m_writable)
+        m_folderCommands->rename(currentNode());
 }
 
 void DirEntryBrowserWidget::moveSelection()
@@ -427,7 +462,8 @@ void DirEntryBrowserWidget::moveSelection()
 
 void DirEntryBrowserWidget::deleteSelection()
 {
-    m_folderCommands->remove(selectedNodes());
+    if (m_writable)
+        m_folderCommands->remove(selectedNodes());
 }
 
 } // namespace vemi

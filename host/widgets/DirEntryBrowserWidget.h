@@ -4,6 +4,7 @@
 #include "host/widgets/FolderNames.h"
 #include "host/widgets/SelectionMemory.h"
 
+#include <QPointer>
 #include <QVector>
 #include <QWidget>
 
@@ -49,6 +50,12 @@ public:
     QAction* actionNew() const { return m_actionNew; }
     QAction* actionOpen() const { return m_actionOpen; }
     QAction* actionSave() const { return m_actionSave; }
+    // The keys of rename and delete (F2, Del) work while the focus is anywhere
+    // inside scope: this browser until a client names its whole tab. Not owned.
+    void setShortcutScope(QWidget* scope);
+    // False when the store cannot be changed: the editing actions are disabled
+    // and the title says "(read-only)".
+    bool isWritable() const { return m_writable; }
 
     // Adds new, open and save to menu, and the folder actions (new folder,
     // rename, move, delete) when withFolderActions is set. The labels name one
@@ -71,6 +78,9 @@ public:
     // Names already used in the folder that "new" files into.
     std::vector<std::string> namesInTargetFolder() const override;
     void clientDestroyed(DirEntryBrowserInterface* client) override;
+
+protected:
+    bool eventFilter(QObject* watched, QEvent* event) override;
 
 public slots:
     void namedObjectWasModified(std::shared_ptr<vemi::NamedObject> object);
@@ -116,7 +126,9 @@ private:
     QAction* m_actionRename = nullptr;
     QAction* m_actionMove = nullptr;
     QAction* m_actionDelete = nullptr;
+    QPointer<QWidget> m_shortcutScope;
     QString m_plural;
+    bool m_writable = true;
     quint64 m_selectionGeneration = 0;
     quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
 };

@@ -1,8 +1,10 @@
 #include "host/widgets/FolderCommands.h"
 
+#include "host/widgets/DeleteQuestion.h"
 #include "host/widgets/DialogAsker.h"
 #include "host/widgets/DirEntryTreeModel.h"
 #include "host/widgets/FirstFreeName.h"
+#include "host/widgets/NameCheck.h"
 
 #include <QWidget>
 
@@ -54,22 +56,39 @@ QString FolderCommands::pathText(const Node* node) const
     return path.join(QLatin1Char('/'));
 }
 
+std::vector<std::string> FolderCommands::namesBeside(const Node* node) const
+{
+    std::vector<std::string> names;
+    for (const auto& sibling : node->parent()->children()) {
+        if (sibling.get() != node)
+            names.push_back(sibling->displayName().toStdString());
+    }
+    return names;
+}
+
 void FolderCommands::createFolder(Node* current)
 {
     if (!m_model)
         return;
     Node* parent = m_model->folderFor(current);
-    const QString suggestion = QString::fromStdString(
-        firstFreeName(tr("New Folder").toStdString(), m_model->namesIn(parent)));
+    const std::vector<std::string> taken = m_model->namesIn(parent);
+    const QString suggestion = QString::fromStdString(firstFreeName(tr("New Folder").toStdString(), taken));
     const quint64 parentSerial = parent ? parent->serial() : 0;
     const std::optional<QString> answer =
-        m_asker->askText(m_dialogParent, tr("New Folder"), tr("Folder name:"), suggestion);
-    const QString name = answer.value_or(QString()).trimmed();
-    if (name.isEmpty())
+        m_asker->askText(m_dialogParent, tr("New Folder"), tr("Folder name:"), suggestion,
+                         [taken](const QString& text) { return NameCheck::problem(text, taken); });
+    if (!answer)
         return;
+    const QString name = answer->trimmed();
     Node* liveParent = parentSerial ? m_model->findBySerial(parentSerial) : nullptr;
     if (parentSerial && !liveParent) {
         emit sgErrorOccurred(tr("The folder was deleted meanwhile."));
+        return;
+    }
+    // The folder may have changed while the user typed.
+    const QString problem = NameCheck::problem(name, m_model->namesIn(liveParent));
+    if (!problem.isEmpty()) {
+        emit sgErrorOccurred(tr("Cannot create the folder \"%1\". %2").arg(name, problem));
         return;
     }
     m_model->createFolder(liveParent, name.toStdString(), {});
@@ -81,11 +100,23 @@ void FolderCommands::rename(Node* node)
         return;
     const quint64 serial = node->serial();
     const QString oldName = node->displayName();
-    const std::optional<QString> answer = m_asker->askText(m_dialogParent, tr("Rename"), tr("New name:"), oldName);
-    const QString name = answer.value_or(QString()).trimmed();
+    const std::vector<std::string> taken = namesBeside(node);
+    const std::optional<QString> answer =
+        m_asker->askText(m_dialogParent, tr("Rename"), tr("New name:"), oldName,
+                         [taken](const QString& text) { return NameCheck::problem(text, taken); });
+    if (!answer)
+        return;
+    const QString name = answer->trimmed();
     node = m_model->findBySerial(serial);
-    if (node && !name.isEmpty() && name != oldName)
-        m_model->renameNode(node, name.toStdString(), {});
+    if (!node || name == oldName)
+        return;
+    // The folder may have changed while the user typed.
+    const QString problem = NameCheck::problem(name, namesBeside(node));
+    if (!problem.isEmpty()) {
+        emit sgErrorOccurred(tr("Cannot rename \"%1\". %2").arg(oldName, problem));
+        return;
+    }
+    m_model->renameNode(node, name.toStdString(), {});
 }
 
 void FolderCommands::move(const QVector<Node*>& nodes)
@@ -120,10 +151,10 @@ void FolderCommands::remove(const QVector<Node*>& nodes)
     if (!m_model || nodes.isEmpty())
         return;
     const std::vector<quint64> serials = serialsOf(nodes);
-    const QString what = nodes.size() == 1 ? QStringLiteral("\"%1\"").arg(nodes.first()->displayName())
-                                           : tr("%1 items").arg(nodes.size());
-    if (!m_asker->confirm(m_dialogParent, tr("Delete"),
-                          tr("Delete %1 with everything in it? This cannot be undone.").arg(what)))
+    const std::vector<const Node*> chosen(nodes.begin(), nodes.end());
+    // No is the default: Enter alone must never delete.
+    if (!m_asker->confirm(m_dialogParent, tr("Delete"), DeleteQuestion::text(m_model->objectType(), chosen),
+                          UserAsker::DefaultAnswer::No))
         return;
     const std::vector<Node*> deleting = liveNodes(serials);
     if (!deleting.empty())

@@ -6,6 +6,7 @@
 #include <QVector>
 
 #include <memory>
+#include <string>
 #include <vector>
 
 class QWidget;
@@ -47,6 +48,8 @@ signals:
     void sgErrorOccurred(QString message);
 
 private:
+    // The names of the node's siblings, folders and entries alike.
+    std::vector<std::string> namesBeside(const BaseObjectTreeModel::Node* node) const;
     static std::vector<quint64> serialsOf(const QVector<BaseObjectTreeModel::Node*>& nodes);
     std::vector<BaseObjectTreeModel::Node*> liveNodes(const std::vector<quint64>& serials) const;
 

@@ -3,6 +3,7 @@
 #include <QString>
 #include <QStringList>
 
+#include <functional>
 #include <optional>
 
 class QWidget;
@@ -14,15 +15,21 @@ namespace vemi {
 class UserAsker
 {
 public:
+    // Why a text cannot be taken as it stands; empty when it can.
+    using TextCheck = std::function<QString(const QString& text)>;
+    enum class DefaultAnswer { Yes, No };
+
     virtual ~UserAsker() = default;
-    // The text entered, or nothing when the user cancelled.
+    // The text entered, or nothing when the user cancelled. A text that check
+    // refuses cannot be confirmed; the user sees why.
     virtual std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
-                                           const QString& suggestion) = 0;
+                                           const QString& suggestion, const TextCheck& check) = 0;
     // The position in items of the one chosen, or nothing when the user cancelled.
     virtual std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
                                        const QStringList& items) = 0;
-    // Whether the user answered yes.
-    virtual bool confirm(QWidget* parent, const QString& title, const QString& question) = 0;
+    // Whether the user answered yes; defaultAnswer is what Enter chooses.
+    virtual bool confirm(QWidget* parent, const QString& title, const QString& question,
+                         DefaultAnswer defaultAnswer) = 0;
 };
 
 } // namespace vemi

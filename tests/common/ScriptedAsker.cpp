@@ -1,13 +1,18 @@
 #include "tests/common/ScriptedAsker.h"
 
 std::optional<QString> ScriptedAsker::askText(QWidget*, const QString& title, const QString& label,
-                                              const QString& suggestion)
+                                              const QString& suggestion, const TextCheck& check)
 {
     m_asked << QStringLiteral("%1: %2 [%3]").arg(title, label, suggestion);
     if (m_texts.empty())
         return std::nullopt;
     const std::optional<QString> answer = m_texts.front();
     m_texts.pop_front();
+    const QString problem = answer && check ? check(*answer) : QString();
+    if (!problem.isEmpty()) {
+        m_asked.last() += QStringLiteral(" refused: ") + problem;
+        return std::nullopt;
+    }
     return answer;
 }
 
@@ -22,9 +27,12 @@ std::optional<int> ScriptedAsker::askItem(QWidget*, const QString& title, const 
     return position >= 0 ? std::optional<int>(position) : std::nullopt;
 }
 
-bool ScriptedAsker::confirm(QWidget*, const QString& title, const QString& question)
+bool ScriptedAsker::confirm(QWidget*, const QString& title, const QString& question,
+                            DefaultAnswer defaultAnswer)
 {
-    m_asked << QStringLiteral("%1: %2").arg(title, question);
+    m_asked << QStringLiteral("%1: %2 [default %3]")
+                   .arg(title, question, defaultAnswer == DefaultAnswer::Yes ? QStringLiteral("Yes")
+                                                                             : QStringLiteral("No"));
     if (m_confirmations.empty())
         return false;
     const bool yes = m_confirmations.front();

@@ -5,8 +5,11 @@
 #include <deque>
 
 // Answers a browser's questions from a script instead of dialogs, in the
-// order they come, and keeps each question ("title: label [suggestion]").
-// A question without a scripted answer is cancelled (or answered no).
+// order they come, and keeps each question ("title: label [suggestion]",
+// "title: question [default No]"). A question without a scripted answer is
+// cancelled (or answered no). A text the question's check refuses is treated
+// as the dialog treats it: the question is cancelled, and the refusal kept
+// ("… refused: reason").
 class ScriptedAsker : public vemi::UserAsker
 {
 public:
@@ -19,10 +22,11 @@ public:
     const QStringList& asked() const { return m_asked; }
 
     std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
-                                   const QString& suggestion) override;
+                                   const QString& suggestion, const TextCheck& check) override;
     std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
                                const QStringList& items) override;
-    bool confirm(QWidget* parent, const QString& title, const QString& question) override;
+    bool confirm(QWidget* parent, const QString& title, const QString& question,
+                 DefaultAnswer defaultAnswer) override;
 
 private:
     std::deque<std::optional<QString>> m_texts;

@@ -12,13 +12,19 @@
 #include "host/widgets/DirEntryTreeModel.h"
 #include "host/widgets/FolderCommands.h"
 #include "host/widgets/FolderNames.h"
+#include "host/widgets/NameCheck.h"
+#include "host/widgets/NameDialog.h"
 #include "host/store/FolderResponse.h"
 #include "host/domain/Header.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/QCJobTemplate.h"
 
 #include <QAction>
+#include <QDialogButtonBox>
+#include <QLabel>
+#include <QLineEdit>
 #include <QMenu>
+#include <QPushButton>
 #include <QTreeView>
 #include <QtTest>
 
@@ -119,9 +125,9 @@ struct Browser
     QMenu menu;
 };
 
-std::string createFolder(TempStore& store, const std::string& name)
+std::string createFolder(TempStore& store, const std::string& name, const std::string& parentId = std::string())
 {
-    const auto answer = store.run(std::make_shared<CreateFolder>(QCJobTemplate::typeId(), "", name));
+    const auto answer = store.run(std::make_shared<CreateFolder>(QCJobTemplate::typeId(), parentId, name));
     const auto folder = std::dynamic_pointer_cast<FolderResponse>(answer.response);
     return folder ? folder->folder().id : std::string();
 }
@@ -162,6 +168,14 @@ private slots:
     void editedObjectSurvivesDeletionElsewhere();
     void renameThenSaveKeepsTheNewName();
     void damagedObjectIsLeftOutOfTheSelection();
+    void deleteQuestionSaysWhatGoes_data();
+    void deleteQuestionSaysWhatGoes();
+    void mouseDragDoesNotSweepARange();
+    void nameCheckRefusesBlankAndTakenNames_data();
+    void nameCheckRefusesBlankAndTakenNames();
+    void renameDialogKeepsOkDisabledForRefusedNames();
+    void readOnlyStoreDisablesEditing_data();
+    void readOnlyStoreDisablesEditing();
 };
 
 void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder_data()
@@ -462,12 +476,21 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct_data()
     QTest::newRow("move files the entry in the folder chosen")
         << "Move To…" << QStringList{"Interior"} << QStringList{"Interior", "New Folder"} << QStringList{"Door Panel"}
         << "Move To: Folder: [(top level), Interior, New Folder]";
+    QTest::newRow("rename to the name of another entry of the folder is refused")
+        << "Rename…" << QStringList{"New Folder"} << unchanged << QStringList{}
+        << "Rename: New name: [Door Panel] refused: \"New Folder\" is already used in this folder.";
+    QTest::newRow("rename to blanks is refused")
+        << "Rename…" << QStringList{"   "} << unchanged << QStringList{}
+        << "Rename: New name: [Door Panel] refused: A name cannot be empty.";
+    QTest::newRow("new folder with a name taken in its folder is refused")
+        << "New Folder…" << QStringList{"Interior"} << unchanged << QStringList{}
+        << "New Folder: Folder name: [New Folder 2] refused: \"Interior\" is already used in this folder.";
     QTest::newRow("confirmed delete removes the entry")
         << "Delete" << QStringList{"yes"} << QStringList{"Interior", "New Folder"} << QStringList{}
-        << "Delete: Delete \"Door Panel\" with everything in it? This cannot be undone.";
+        << "Delete: Delete the Job Template \"Door Panel\"? This cannot be undone. [default No]";
     QTest::newRow("declined delete keeps the entry")
         << "Delete" << QStringList{"no"} << unchanged << QStringList{}
-        << "Delete: Delete \"Door Panel\" with everything in it? This cannot be undone.";
+        << "Delete: Delete the Job Template \"Door Panel\"? This cannot be undone. [default No]";
 }
 
 void tst_DirEntryBrowser::folderCommandsAskThenAct()
@@ -522,7 +545,9 @@ void tst_DirEntryBrowser::refusedRenameKeepsTheStoredName()
     asker.scriptText(QStringLiteral("Door Trim"));
     browser.widget.folderCommands()->setAsker(&asker);
 
-    browser.action(QStringLiteral("Rename…"))->trigger();
+    // The browser disables Rename on a read-only store; the command is sent
+    // anyway, as if the store had become read-only since.
+    browser.widget.folderCommands()->rename(node);
     QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
     QVERIFY(browser.widget.findChild<QMessageBox*>()->text().contains(QStringLiteral("read-only")));
     QCOMPARE(node->displayName(), QStringLiteral("Door Panel"));
@@ -608,6 +633,215 @@ void tst_DirEntryBrowser::damagedObjectIsLeftOutOfTheSelection()
     QVERIFY(selections.first().first().value<QVector<Node*>>().isEmpty());
     QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
     QVERIFY(browser.widget.findChild<QMessageBox*>()->text().contains(QStringLiteral("damaged")));
+}
+
+void tst_DirEntryBrowser::deleteQuestionSaysWhatGoes_data()
+{
+    QTest::addColumn<QStringList>("selected");
+    QTest::addColumn<QString>("question");
+    // "Bumpers" holds "Bumper Left" (changed, not saved), "Bumper Right",
+    // "Bumper Rear" and the folder "Clips" with "Clip A"; "Spare" is empty.
+    const QString undone = QStringLiteral(" This cannot be undone.");
+    const QString lost = QStringLiteral("\n\nUnsaved changes will be lost in:\n  • Bumper Left");
+    const QString defaultNo = QStringLiteral(" [default No]");
+    QTest::newRow("one template is named alone, not with everything in it")
+        << QStringList{"Door Panel"} << "Delete: Delete the Job Template \"Door Panel\"?" + undone + defaultNo;
+    QTest::newRow("one unsaved template says its changes go too")
+        << QStringList{"Bumper Left"} << "Delete: Delete the Job Template \"Bumper Left\"?" + undone + lost + defaultNo;
+    QTest::newRow("a folder counts what is in it and names the unsaved template")
+        << QStringList{"Bumpers"}
+        << "Delete: Delete the folder \"Bumpers\" with everything in it: 4 Job Templates and 1 folder?" + undone
+               + lost + defaultNo;
+    QTest::newRow("an empty folder says so")
+        << QStringList{"Spare"} << "Delete: Delete the empty folder \"Spare\"?" + undone + defaultNo;
+    QTest::newRow("several templates are counted")
+        << QStringList{"Door Panel", "Bumper Rear"} << "Delete: Delete these 2 Job Templates?" + undone + defaultNo;
+    QTest::newRow("a template inside a selected folder is counted once")
+        << QStringList{"Bumpers", "Bumper Right", "Door Panel"}
+        << "Delete: Delete these 2 items with everything in them: 5 Job Templates and 2 folders in all?" + undone
+               + lost + defaultNo;
+}
+
+void tst_DirEntryBrowser::deleteQuestionSaysWhatGoes()
+{
+    QFETCH(QStringList, selected);
+    QFETCH(QString, question);
+    TempStore store;
+    const std::string bumpers = createFolder(store, "Bumpers");
+    for (const char* name : {"Bumper Left", "Bumper Right", "Bumper Rear"})
+        storeTemplate(store, name, bumpers);
+    storeTemplate(store, "Clip A", createFolder(store, "Clips", bumpers));
+    storeTemplate(store, "Door Panel", "");
+    createFolder(store, "Spare");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Bumper Left")));
+    browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Bumper Left"))->object());
+    auto* selection = browser.widget.treeView()->selectionModel();
+    selection->clearSelection();
+    for (const QString& name : selected)
+        selection->select(browser.model.indexFromNode(browser.find(name)), QItemSelectionModel::Select);
+    ScriptedAsker asker;
+    browser.widget.folderCommands()->setAsker(&asker);
+
+    browser.action(QStringLiteral("Delete"))->trigger();
+    QCOMPARE(asker.asked(), QStringList{question});
+    // Declined: everything stays, in the tree and in the store.
+    QTest::qWait(50);
+    for (const QString& name : selected)
+        QVERIFY2(browser.find(name), qPrintable(name));
+}
+
+// A press on one entry, a move over others with the button held and a
+// release must leave one entry selected: a sweep made "Delete 8 items" out
+// of what the user meant as a click.
+void tst_DirEntryBrowser::mouseDragDoesNotSweepARange()
+{
+    TempStore store;
+    for (const char* name : {"Part 1", "Part 2", "Part 3", "Part 4"})
+        storeTemplate(store, name, "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Part 4")));
+    browser.widget.resize(300, 400);
+    browser.widget.show();
+    QVERIFY(QTest::qWaitForWindowExposed(&browser.widget));
+    QTreeView* tree = browser.widget.treeView();
+    const auto centreOf = [&](const QString& name) {
+        return tree->visualRect(browser.model.indexFromNode(browser.find(name))).center();
+    };
+    const QPoint from = centreOf(QStringLiteral("Part 1"));
+    const QPoint to = centreOf(QStringLiteral("Part 4"));
+    // Sent by hand: QTest::mouseMove carries no held button.
+    QTest::mousePress(tree->viewport(), Qt::LeftButton, Qt::NoModifier, from);
+    for (int y = from.y(); y <= to.y(); y += 4) {
+        QMouseEvent move(QEvent::MouseMove, QPoint(from.x(), y), tree->viewport()->mapToGlobal(QPoint(from.x(), y)),
+                         Qt::NoButton, Qt::LeftButton, Qt::NoModifier);
+        QApplication::sendEvent(tree->viewport(), &move);
+    }
+    QTest::mouseRelease(tree->viewport(), Qt::LeftButton, Qt::NoModifier, to);
+    QCOMPARE(tree->selectionModel()->selectedRows().size(), 1);
+
+    // Ctrl+click still adds to the selection.
+    QTest::mouseClick(tree->viewport(), Qt::LeftButton, Qt::ControlModifier, centreOf(QStringLiteral("Part 3")));
+    QCOMPARE(tree->selectionModel()->selectedRows().size(), 2);
+}
+
+void tst_DirEntryBrowser::nameCheckRefusesBlankAndTakenNames_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("problem");
+    QTest::newRow("a free name is fine") << "Bumper Rear" << "";
+    QTest::newRow("an empty name is refused") << "" << "A name cannot be empty.";
+    QTest::newRow("blanks only are refused") << " \t " << "A name cannot be empty.";
+    QTest::newRow("a name taken in the folder is refused")
+        << "Bumper Left" << "\"Bumper Left\" is already used in this folder.";
+    QTest::newRow("blanks around a taken name do not make it free")
+        << "  Bumper Left " << "\"Bumper Left\" is already used in this folder.";
+    QTest::newRow("a name that only begins like a taken one is fine") << "Bumper Left 2" << "";
+}
+
+void tst_DirEntryBrowser::nameCheckRefusesBlankAndTakenNames()
+{
+    QFETCH(QString, name);
+    QFETCH(QString, problem);
+    QCOMPARE(NameCheck::problem(name, {"Bumper Left", "Clips"}), problem);
+}
+
+// The real dialog of the browser's Rename, driven by keys.
+void tst_DirEntryBrowser::renameDialogKeepsOkDisabledForRefusedNames()
+{
+    TempStore store;
+    storeTemplate(store, "Bumper Left", "");
+    storeTemplate(store, "Bumper Right", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Bumper Right")));
+    struct Seen
+    {
+        bool okAtFirst = false;
+        bool okForTaken = true;
+        QString problemForTaken;
+        bool okForBlank = true;
+        bool openAfterEnterOnBlank = false;
+    } seen;
+    ModalAnswer::actOnNextModal([&seen](QWidget* modal) {
+        auto* dialog = qobject_cast<NameDialog*>(modal);
+        if (!dialog) {
+            modal->close();
+            QFAIL("expected the name dialog");
+        }
+        auto* edit = dialog->findChild<QLineEdit*>();
+        QPushButton* ok = dialog->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok);
+        auto* problem = dialog->findChild<QLabel*>(QStringLiteral("problem"));
+        seen.okAtFirst = ok->isEnabled();
+        // The suggestion is selected: typing replaces it.
+        QTest::keyClicks(edit, QStringLiteral("Bumper Left"));
+        seen.okForTaken = ok->isEnabled();
+        seen.problemForTaken = problem->isVisible() ? problem->text() : QString();
+        edit->selectAll();
+        QTest::keyClick(edit, Qt::Key_Space);
+        seen.okForBlank = ok->isEnabled();
+        QTest::keyClick(edit, Qt::Key_Return);
+        seen.openAfterEnterOnBlank = dialog->isVisible();
+        edit->selectAll();
+        QTest::keyClicks(edit, QStringLiteral("Bumper Rear"));
+        QTest::keyClick(edit, Qt::Key_Return);
+    });
+    browser.action(QStringLiteral("Rename…"))->trigger();
+
+    QVERIFY(seen.okAtFirst);
+    QVERIFY(!seen.okForTaken);
+    QCOMPARE(seen.problemForTaken, QStringLiteral("\"Bumper Left\" is already used in this folder."));
+    QVERIFY(!seen.okForBlank);
+    QVERIFY(seen.openAfterEnterOnBlank);
+    QTRY_VERIFY(browser.find(QStringLiteral("Bumper Rear")));
+    QCOMPARE(browser.namesIn(nullptr), (QStringList{"Bumper Left", "Bumper Rear"}));
+}
+
+void tst_DirEntryBrowser::readOnlyStoreDisablesEditing_data()
+{
+    QTest::addColumn<QString>("how");
+    QTest::addColumn<bool>("writable");
+    QTest::newRow("a writable store offers every action") << "writable" << true;
+    QTest::newRow("a store opened read-only") << "read-only option" << false;
+    QTest::newRow("a store whose folder the user may not write") << "folder not writable" << false;
+}
+
+void tst_DirEntryBrowser::readOnlyStoreDisablesEditing()
+{
+    QFETCH(QString, how);
+    QFETCH(bool, writable);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    QFile::Permissions permissions = QFile::permissions(store.folder());
+    if (how == QLatin1String("read-only option")) {
+        StoreOptions readOnly;
+        readOnly.readOnly = true;
+        store.reopen(readOnly);
+    } else if (how == QLatin1String("folder not writable")) {
+        QVERIFY(QFile::setPermissions(store.folder(), QFile::ReadOwner | QFile::ExeOwner));
+        if (QFileInfo(store.folder()).isWritable()) {
+            QFile::setPermissions(store.folder(), permissions);
+            QSKIP("this user may write any folder (root)");
+        }
+    }
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
+    ScriptedAsker asker;
+    browser.widget.folderCommands()->setAsker(&asker);
+    browser.widget.show();
+    QVERIFY(QTest::qWaitForWindowActive(&browser.widget));
+    browser.widget.treeView()->setFocus();
+
+    QCOMPARE(browser.widget.isWritable(), writable);
+    for (const QString& text : {"New Job Template", "New Folder…", "Rename…", "Move To…", "Delete"}) {
+        QAction* action = text == QLatin1String("New Job Template") ? browser.widget.actionNew() : browser.action(text);
+        QVERIFY2(action && action->isEnabled() == writable, qPrintable(text));
+    }
+    QVERIFY(browser.action(QStringLiteral("Open Job Template…"))->isEnabled());
+    QCOMPARE(browser.widget.findChild<QLabel*>()->text().contains(QStringLiteral("(read-only)")), !writable);
+    // Del asks only where deleting can succeed.
+    QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete);
+    QCOMPARE(asker.asked().size(), writable ? 1 : 0);
+    QFile::setPermissions(store.folder(), permissions);
 }
 
 QC_TEST_MAIN(tst_DirEntryBrowser)

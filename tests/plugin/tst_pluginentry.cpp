@@ -137,7 +137,7 @@ void tst_PluginEntry::fileMenuHoldsBrowserEntriesThenRefresh()
 
     QCOMPARE(topBar.actions().size(), 1);
     QMenu* menu = topBar.actions().first()->menu();
-    QCOMPARE(menu->title(), QStringLiteral("File"));
+    QCOMPARE(menu->title(), QStringLiteral("&File"));
     const QList<QAction*> entries = menu->actions();
     QVERIFY(entries.size() >= 5);
     QCOMPARE(entries.at(0)->text(), QStringLiteral("New Job Template"));
