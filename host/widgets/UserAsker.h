@@ -18,9 +18,6 @@ public:
     // The text entered, or nothing when the user cancelled.
     virtual std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
                                            const QString& suggestion) = 0;
-    // The position in items of the one chosen, or nothing when the user cancelled.
-    virtual std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
-                                       const QStringList& items) = 0;
     // Whether the user answered yes.
     virtual bool confirm(QWidget* parent, const QString& title, const QString& question) = 0;
 };
