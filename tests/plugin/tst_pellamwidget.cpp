@@ -169,9 +169,10 @@ void tst_PellamWidget::narrowWindowKeepsBrowserReadable()
     QTreeView* tree = browser->treeView();
     const int rowWidth = tree->indentation() + tree->style()->pixelMetric(QStyle::PM_SmallIconSize)
         + tree->fontMetrics().horizontalAdvance(QStringLiteral("Door Panel Left 1234"));
-    const QString actual = QStringLiteral("tree shows %1 px, the row needs %2 px").arg(tree->viewport()->width()).arg(rowWidth);
-    QVERIFY2(browser->isVisible() && tree->viewport()->width() >= rowWidth, qPrintable(actual));
-    QCOMPARE(splitter->sizes().first(), browser->width());
+    // A collapsed browser keeps its size but lies outside the splitter: its share tells.
+    const int shown = std::min(splitter->sizes().first(), tree->viewport()->width());
+    const QString actual = QStringLiteral("tree shows %1 px, the row needs %2 px").arg(shown).arg(rowWidth);
+    QVERIFY2(browser->isVisible() && shown >= rowWidth, qPrintable(actual));
 }
 
 void tst_PellamWidget::selectionDecidesPageAndTemplate_data()
