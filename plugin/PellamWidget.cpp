@@ -48,6 +48,8 @@ PellamWidget::PellamWidget(std::shared_ptr<PellamSettings>, std::shared_ptr<Gene
     // Keeps the default share of the width (100 : 600) as the window grows.
     m_splitter->setStretchFactor(0, 1);
     m_splitter->setStretchFactor(1, 6);
+    // The browser keeps its minimum width: a collapsed browser hides every template.
+    m_splitter->setCollapsible(0, false);
 
     if (!m_splitter->restoreState(QSettings().value(PellamKeys::MainSplitterState, QVariant()).toByteArray()))
         m_splitter->setSizes({100, 600});

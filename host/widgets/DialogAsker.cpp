@@ -16,15 +16,6 @@ std::optional<QString> DialogAsker::askText(QWidget* parent, const QString& titl
     return dialog.exec() == QDialog::Accepted ? std::optional<QString>(dialog.name()) : std::nullopt;
 }
 
-std::optional<int> DialogAsker::askItem(QWidget* parent, const QString& title, const QString& label,
-                                        const QStringList& items)
-{
-    bool ok = false;
-    const QString chosen = QInputDialog::getItem(parent, title, label, items, 0, false, &ok);
-    const int position = items.indexOf(chosen);
-    return ok && position >= 0 ? std::optional<int>(position) : std::nullopt;
-}
-
 bool DialogAsker::confirm(QWidget* parent, const QString& title, const QString& question,
                           DefaultAnswer defaultAnswer)
 {

@@ -11,8 +11,6 @@ class DialogAsker : public UserAsker
 public:
     std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
                                    const QString& suggestion, const TextCheck& check) override;
-    std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
-                               const QStringList& items) override;
     bool confirm(QWidget* parent, const QString& title, const QString& question,
                  DefaultAnswer defaultAnswer) override;
 };

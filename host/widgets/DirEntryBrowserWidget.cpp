@@ -5,19 +5,20 @@
 #include "host/widgets/DirEntryTreeModel.h"
 #include "host/widgets/FolderCommands.h"
 #include "host/widgets/ObjectTypeNames.h"
+#include "host/widgets/TreePickerDialog.h"
 #include "host/domain/NamedObject.h"
 #include "host/store/MarloModel.h"
 
 #include <QAction>
 #include <QEventLoop>
 #include <QHeaderView>
-#include <QInputDialog>
 #include <QLabel>
 #include <QMenu>
 #include <QMessageBox>
 #include <QMouseEvent>
 #include <QPointer>
 #include <QPushButton>
+#include <QStyle>
 #include <QTreeView>
 #include <QVBoxLayout>
 
@@ -41,12 +42,24 @@ DirEntryBrowserWidget::DirEntryBrowserWidget(QWidget* parent)
     m_tree->viewport()->installEventFilter(this);
     connect(m_tree, &QWidget::customContextMenuRequested, this, &DirEntryBrowserWidget::showContextMenu);
     connect(m_folderCommands, &FolderCommands::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+    connect(m_folderCommands, &FolderCommands::sgMoved, this, &DirEntryBrowserWidget::restoreSelection);
+    keepNamesReadable();
 
     auto* layout = new QVBoxLayout(this);
     layout->setContentsMargins(4, 4, 4, 4);
     layout->addWidget(m_title);
     layout->addWidget(m_tree);
     createActions();
+}
+
+void DirEntryBrowserWidget::keepNamesReadable()
+{
+    // Room for about twenty characters of a name beside its icon, so that a
+    // narrow window or splitter cannot squeeze the tree until no name reads.
+    const int nameRoom = m_tree->fontMetrics().averageCharWidth() * 20;
+    const int decoration = m_tree->indentation() + style()->pixelMetric(QStyle::PM_SmallIconSize)
+        + style()->pixelMetric(QStyle::PM_ScrollBarExtent) + 2 * m_tree->frameWidth() + 8;
+    m_tree->setMinimumWidth(nameRoom + decoration);
 }
 
 DirEntryBrowserWidget::~DirEntryBrowserWidget()
@@ -129,6 +142,9 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     connect(m_tree->selectionModel(), &QItemSelectionModel::selectionChanged, this,
             &DirEntryBrowserWidget::onTreeSelectionChanged);
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+    // Every reload rebuilds the nodes; the view keeps its open folders and selection.
+    connect(m_model, &QAbstractItemModel::modelAboutToBeReset, this, &DirEntryBrowserWidget::keepViewState);
+    connect(m_model, &QAbstractItemModel::modelReset, this, &DirEntryBrowserWidget::restoreViewState);
 
     const std::string remembered = m_selectionMemory.remembered();
     m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this), remembered](bool ok) {
@@ -323,25 +339,25 @@ void DirEntryBrowserWidget::openObject()
 {
     if (!m_model)
         return;
-    // The dialog runs its own event loop, in which answers from the store may
-    // rebuild the tree: hold serials across it, not nodes.
-    QStringList names;
-    std::vector<quint64> serials;
-    for (Node* node : m_model->descendants(m_model->root())) {
-        if (!node->isFolder()) {
-            names << m_folderCommands->pathText(node);
-            serials.push_back(node->serial());
-        }
-    }
-    if (serials.empty()) {
+    const auto nodes = m_model->descendants(m_model->root());
+    if (std::none_of(nodes.begin(), nodes.end(), [](const Node* node) { return !node->isFolder(); })) {
         showError(tr("There is nothing to open yet."));
         return;
     }
-    bool ok = false;
-    const QString chosen = QInputDialog::getItem(this, m_actionOpen->text(), m_plural, names, 0, false, &ok);
-    if (!ok || !names.contains(chosen))
+    QString title = m_actionOpen->text();
+    title.remove(QLatin1Char('&')).remove(QChar(0x2026));
+    // The dialog runs its own event loop, in which answers from the store may
+    // rebuild the tree: it answers with a serial, not a node, and dies with
+    // this browser should that close meanwhile.
+    QPointer<TreePickerDialog> picker =
+        new TreePickerDialog(*m_model, TreePickerDialog::Choice::Entry, title, m_plural + QLatin1Char(':'), this);
+    picker->preselect(currentNode());
+    picker->exec();
+    if (!picker)
         return;
-    if (Node* node = m_model->findBySerial(serials[size_t(names.indexOf(chosen))]))
+    const std::optional<quint64> chosen = picker->chosenSerial();
+    delete picker;
+    if (Node* node = chosen ? m_model->findBySerial(*chosen) : nullptr)
         selectNode(node);
 }
 
@@ -434,13 +450,21 @@ QString DirEntryBrowserWidget::unsavedChangesQuestion(const std::string& typeId,
 
 void DirEntryBrowserWidget::refresh()
 {
-    if (!m_model)
-        return;
-    const std::vector<std::string> keys = selectionKeys();
-    m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this), keys](bool ok) {
-        if (self && ok)
-            restoreSelection(keys);
-    });
+    if (m_model)
+        m_model->load();
+}
+
+void DirEntryBrowserWidget::keepViewState()
+{
+    m_expandedFolders.capture(*m_tree, *m_model);
+    m_keptSelection = selectionKeys();
+}
+
+void DirEntryBrowserWidget::restoreViewState()
+{
+    m_expandedFolders.restore(*m_tree, *m_model);
+    if (!m_keptSelection.empty())
+        restoreSelection(m_keptSelection);
 }
 
 void DirEntryBrowserWidget::createFolder()

@@ -1,6 +1,7 @@
 #pragma once
 
 #include "host/widgets/BaseObjectTreeModel.h"
+#include "host/widgets/ExpandedFolders.h"
 #include "host/widgets/FolderNames.h"
 #include "host/widgets/SelectionMemory.h"
 
@@ -62,7 +63,8 @@ public:
     // object and several in the actions' texts and the questions asked.
     void createCustomMenus(QMenu* menu, const QString& singular, const QString& plural, bool withFolderActions);
 
-    // Reads the tree again from the store; unsaved work is kept.
+    // Reads the tree again from the store; unsaved work, open folders and the
+    // selection are kept.
     void refresh();
     // Asks Save / Discard / Cancel when objects are unsaved; true when the
     // browser may close (everything saved or the user chose to discard).
@@ -91,6 +93,9 @@ signals:
 
 private:
     void createActions();
+    void keepNamesReadable();
+    void keepViewState();
+    void restoreViewState();
     void onTreeSelectionChanged();
     void emitSelection(quint64 generation);
     void rememberSelection();
@@ -119,6 +124,8 @@ private:
     QTreeView* m_tree;
     FolderCommands* m_folderCommands;
     SelectionMemory m_selectionMemory;
+    ExpandedFolders m_expandedFolders;
+    std::vector<std::string> m_keptSelection; // across a reload of the tree
     QAction* m_actionNew = nullptr;
     QAction* m_actionOpen = nullptr;
     QAction* m_actionSave = nullptr;

@@ -21,6 +21,8 @@
 
 #include <QIcon>
 
+#include <algorithm>
+
 
 namespace vemi {
 
@@ -71,14 +73,17 @@ void DirEntryTreeModel::load(const Done& done)
 {
     run(std::make_shared<GetDirectoryTree>(m_objectType),
         [this](const std::shared_ptr<Response>& response) {
-            const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response);
-            if (!tree)
-                return;
-            rebuildTree([&tree](std::vector<std::unique_ptr<Node>>& previous, Node* root) {
-                DirEntryTreeBuilder(previous).build(*tree, root);
-            });
+            if (const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response))
+                applyListing(*tree);
         },
         done);
+}
+
+void DirEntryTreeModel::applyListing(const DirectoryTreeResponse& tree)
+{
+    rebuildTree([&tree](std::vector<std::unique_ptr<Node>>& previous, Node* root) {
+        DirEntryTreeBuilder(previous).build(tree, root);
+    });
 }
 
 DirEntryTreeModel::FolderNode* DirEntryTreeModel::folderFor(Node* node) const
@@ -130,7 +135,49 @@ void DirEntryTreeModel::loadObject(DirEntryNode* node, const Done& done)
                                 if (done)
                                     done(true);
                             },
-                            failure(done));
+                            [this, serial, done](const std::shared_ptr<ErrorInfo>& error) {
+                                explainFailedLoad(serial, error->message(), done);
+                            });
+}
+
+void DirEntryTreeModel::explainFailedLoad(quint64 serial, const QString& message, const Done& done)
+{
+    const auto fail = [this, message, done]() {
+        emit sgErrorOccurred(message);
+        if (done)
+            done(false);
+    };
+    auto* node = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+    if (!node || !node->isSaved()) {
+        fail();
+        return;
+    }
+    // An entry deleted in another window or program can no longer be read: the
+    // store's listing tells that case from a damaged object. Only when the entry
+    // is gone is the tree read again (reading it again would select a damaged
+    // object anew, and fail anew).
+    const std::string entryId = node->dirEntry()->id();
+    const QString name = node->displayName();
+    CommandSender::send(
+        m_store, m_dispatcherId, std::make_shared<GetDirectoryTree>(m_objectType), this,
+        [this, entryId, name, fail, done](const std::shared_ptr<Response>& response) {
+            const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response);
+            const auto& entries = tree ? tree->entries() : std::vector<std::shared_ptr<DirEntry>>();
+            const bool listed = !tree || std::any_of(entries.begin(), entries.end(), [&entryId](const auto& entry) {
+                return entry->id() == entryId;
+            });
+            if (listed) {
+                fail();
+                return;
+            }
+            applyListing(*tree);
+            emit sgErrorOccurred(tr("Cannot open \"%1\": it was deleted elsewhere, in another window or program. "
+                                    "The list now shows what the store holds.")
+                                     .arg(name));
+            if (done)
+                done(false);
+        },
+        [fail](const std::shared_ptr<ErrorInfo>&) { fail(); });
 }
 
 void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)

@@ -11,6 +11,7 @@ namespace vemi {
 
 class Command;
 class DirEntry;
+class DirectoryTreeResponse;
 class ErrorInfo;
 class MarloModel;
 class Response;
@@ -77,7 +78,8 @@ public:
 
     DirEntryNode* addUnsavedObject(Node* folder, std::shared_ptr<NamedObject> object);
     // Fetches from the store the entry names (EntryObjectFetch), which for a
-    // GlobalDirEntry may be another than the model's own.
+    // GlobalDirEntry may be another than the model's own. When the entry was
+    // deleted elsewhere, the error says so and the tree is read again.
     void loadObject(DirEntryNode* node, const Done& done);
     void saveObject(DirEntryNode* node, const Done& done);
     void createFolder(Node* parentFolder, const std::string& name, const Done& done);
@@ -98,6 +100,8 @@ private:
     void run(std::shared_ptr<Command> command, const OnResponse& onResponse, const Done& done);
     std::function<void(const std::shared_ptr<ErrorInfo>&)> failure(const Done& done);
     static std::string folderIdOf(const Node* folder);
+    void applyListing(const DirectoryTreeResponse& tree);
+    void explainFailedLoad(quint64 serial, const QString& message, const Done& done);
     void applyRename(quint64 serial, const std::string& name);
     void undoRename(quint64 serial, const std::string& name, const std::string& oldName);
 

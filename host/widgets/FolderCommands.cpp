@@ -5,6 +5,10 @@
 #include "host/widgets/DirEntryTreeModel.h"
 #include "host/widgets/FirstFreeName.h"
 #include "host/widgets/NameCheck.h"
+#include "host/widgets/SelectionMemory.h"
+#include "host/widgets/TreePickerDialog.h"
+
+#include <QPointer>
 
 #include <QWidget>
 
@@ -44,16 +48,6 @@ std::vector<Node*> FolderCommands::liveNodes(const std::vector<quint64>& serials
             nodes.push_back(node);
     }
     return nodes;
-}
-
-QString FolderCommands::pathText(const Node* node) const
-{
-    QStringList path;
-    for (const std::string& folder : m_model->pathOf(node))
-        path << QString::fromStdString(folder);
-    if (!node->isFolder())
-        path << node->displayName();
-    return path.join(QLatin1Char('/'));
 }
 
 std::vector<std::string> FolderCommands::namesBeside(const Node* node) const
@@ -124,26 +118,40 @@ void FolderCommands::move(const QVector<Node*>& nodes)
     if (!m_model || nodes.isEmpty())
         return;
     const std::vector<quint64> moving = serialsOf(nodes);
-    QStringList paths{tr("(top level)")};
-    QVector<Node*> folders{nullptr};
-    for (Node* node : m_model->descendants(m_model->root())) {
-        if (node->isFolder()) {
-            paths << pathText(node);
-            folders.append(node);
-        }
-    }
-    const std::vector<quint64> folderSerials = serialsOf(folders);
-    const std::optional<int> chosen = m_asker->askItem(m_dialogParent, tr("Move To"), tr("Folder:"), paths);
-    if (!chosen || *chosen < 0 || *chosen >= paths.size())
+    std::vector<std::string> keys;
+    for (const Node* node : nodes)
+        keys.push_back(SelectionMemory::keyOf(node));
+    const std::optional<quint64> targetSerial = askTargetFolder(nodes);
+    if (!targetSerial)
         return;
-    const quint64 targetSerial = folderSerials[size_t(*chosen)];
-    Node* target = targetSerial ? m_model->findBySerial(targetSerial) : nullptr;
-    if (targetSerial && !target) {
+    Node* target = *targetSerial ? m_model->findBySerial(*targetSerial) : nullptr;
+    if (*targetSerial && !target) {
         emit sgErrorOccurred(tr("The folder was deleted meanwhile."));
         return;
     }
-    for (Node* node : liveNodes(moving))
-        m_model->moveNode(node, target, {});
+    const std::vector<Node*> live = liveNodes(moving);
+    auto pending = std::make_shared<size_t>(live.size());
+    const auto finishOne = [self = QPointer<FolderCommands>(this), pending, keys](bool) {
+        if (--*pending == 0 && self)
+            emit self->sgMoved(keys);
+    };
+    for (Node* node : live)
+        m_model->moveNode(node, target, finishOne);
+}
+
+std::optional<quint64> FolderCommands::askTargetFolder(const QVector<Node*>& nodes)
+{
+    const std::vector<const Node*> moving(nodes.begin(), nodes.end());
+    // The dialog dies with its parent, should that close while it is open.
+    QPointer<TreePickerDialog> picker = new TreePickerDialog(*m_model, TreePickerDialog::Choice::Folder,
+                                                             tr("Move To"), tr("Folder:"), m_dialogParent, moving);
+    picker->preselect(dynamic_cast<const DirEntryTreeModel::FolderNode*>(nodes.first()->parent()));
+    picker->exec();
+    if (!picker)
+        return std::nullopt;
+    const std::optional<quint64> chosen = picker->chosenSerial();
+    delete picker;
+    return chosen;
 }
 
 void FolderCommands::remove(const QVector<Node*>& nodes)

@@ -6,6 +6,7 @@
 #include <QVector>
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
@@ -40,16 +41,18 @@ public:
     void move(const QVector<BaseObjectTreeModel::Node*>& nodes);
     void remove(const QVector<BaseObjectTreeModel::Node*>& nodes);
 
-    // "Folder/Sub folder/Name" for an object, "Folder/Sub folder" for a folder.
-    QString pathText(const BaseObjectTreeModel::Node* node) const;
-
 signals:
     // A command could not run; the store's own refusals come through the model.
     void sgErrorOccurred(QString message);
+    // A move has been answered by the store; keys (SelectionMemory::keyOf)
+    // name the nodes moved, each where the store now files it.
+    void sgMoved(const std::vector<std::string>& keys);
 
 private:
     // The names of the node's siblings, folders and entries alike.
     std::vector<std::string> namesBeside(const BaseObjectTreeModel::Node* node) const;
+    // The serial of the folder chosen, 0 for the top level; nothing when cancelled.
+    std::optional<quint64> askTargetFolder(const QVector<BaseObjectTreeModel::Node*>& nodes);
     static std::vector<quint64> serialsOf(const QVector<BaseObjectTreeModel::Node*>& nodes);
     std::vector<BaseObjectTreeModel::Node*> liveNodes(const std::vector<quint64>& serials) const;
 

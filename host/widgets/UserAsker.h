@@ -24,9 +24,6 @@ public:
     // refuses cannot be confirmed; the user sees why.
     virtual std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
                                            const QString& suggestion, const TextCheck& check) = 0;
-    // The position in items of the one chosen, or nothing when the user cancelled.
-    virtual std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
-                                       const QStringList& items) = 0;
     // Whether the user answered yes; defaultAnswer is what Enter chooses.
     virtual bool confirm(QWidget* parent, const QString& title, const QString& question,
                          DefaultAnswer defaultAnswer) = 0;

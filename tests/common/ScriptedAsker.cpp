@@ -16,17 +16,6 @@ std::optional<QString> ScriptedAsker::askText(QWidget*, const QString& title, co
     return answer;
 }
 
-std::optional<int> ScriptedAsker::askItem(QWidget*, const QString& title, const QString& label,
-                                          const QStringList& items)
-{
-    m_asked << QStringLiteral("%1: %2 [%3]").arg(title, label, items.join(QStringLiteral(", ")));
-    if (m_items.empty())
-        return std::nullopt;
-    const int position = items.indexOf(m_items.front());
-    m_items.pop_front();
-    return position >= 0 ? std::optional<int>(position) : std::nullopt;
-}
-
 bool ScriptedAsker::confirm(QWidget*, const QString& title, const QString& question,
                             DefaultAnswer defaultAnswer)
 {

@@ -15,22 +15,17 @@ class ScriptedAsker : public vemi::UserAsker
 public:
     // nothing: the user cancels.
     void scriptText(std::optional<QString> answer) { m_texts.push_back(std::move(answer)); }
-    // The item whose text is chosen; an unknown text cancels.
-    void scriptItem(const QString& chosen) { m_items.push_back(chosen); }
     void scriptConfirm(bool yes) { m_confirmations.push_back(yes); }
 
     const QStringList& asked() const { return m_asked; }
 
     std::optional<QString> askText(QWidget* parent, const QString& title, const QString& label,
                                    const QString& suggestion, const TextCheck& check) override;
-    std::optional<int> askItem(QWidget* parent, const QString& title, const QString& label,
-                               const QStringList& items) override;
     bool confirm(QWidget* parent, const QString& title, const QString& question,
                  DefaultAnswer defaultAnswer) override;
 
 private:
     std::deque<std::optional<QString>> m_texts;
-    std::deque<QString> m_items;
     std::deque<bool> m_confirmations;
     QStringList m_asked;
 };

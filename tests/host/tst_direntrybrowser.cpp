@@ -18,6 +18,7 @@
 #include "host/domain/Header.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/QCJobTemplate.h"
+#include "host/widgets/TreePickerDialog.h"
 
 #include <QAction>
 #include <QDialogButtonBox>
@@ -25,6 +26,7 @@
 #include <QLineEdit>
 #include <QMenu>
 #include <QPushButton>
+#include <QScreen>
 #include <QTreeView>
 #include <QtTest>
 
@@ -146,6 +148,8 @@ class tst_DirEntryBrowser : public QObject
     Q_OBJECT
 
 private slots:
+    // Before the first sort: the browser's order is made once, in the default locale.
+    void initTestCase() { QLocale::setDefault(QLocale(QLocale::German, QLocale::Germany)); }
     void init() { QSettings().clear(); }
     void newObjectGetsFirstFreeNameOfItsFolder_data();
     void newObjectGetsFirstFreeNameOfItsFolder();
@@ -176,6 +180,16 @@ private slots:
     void renameDialogKeepsOkDisabledForRefusedNames();
     void readOnlyStoreDisablesEditing_data();
     void readOnlyStoreDisablesEditing();
+    void openPickerTellsPlacesApart_data();
+    void openPickerTellsPlacesApart();
+    void pickerWithLongNameFitsTheScreen();
+    void movePickerOffersOnlyPlacesToGo_data();
+    void movePickerOffersOnlyPlacesToGo();
+    void entryDeletedElsewhereIsSaidAndRemoved_data();
+    void entryDeletedElsewhereIsSaidAndRemoved();
+    void refreshKeepsOpenFoldersAndSelection_data();
+    void refreshKeepsOpenFoldersAndSelection();
+    void namesSortAsPeopleRead();
 };
 
 void tst_DirEntryBrowser::newObjectGetsFirstFreeNameOfItsFolder_data()
@@ -473,9 +487,6 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct_data()
     QTest::newRow("rename changes the entry's name")
         << "Rename…" << QStringList{"Door Trim"} << QStringList{"Interior", "New Folder", "Door Trim"}
         << QStringList{} << "Rename: New name: [Door Panel]";
-    QTest::newRow("move files the entry in the folder chosen")
-        << "Move To…" << QStringList{"Interior"} << QStringList{"Interior", "New Folder"} << QStringList{"Door Panel"}
-        << "Move To: Folder: [(top level), Interior, New Folder]";
     QTest::newRow("rename to the name of another entry of the folder is refused")
         << "Rename…" << QStringList{"New Folder"} << unchanged << QStringList{}
         << "Rename: New name: [Door Panel] refused: \"New Folder\" is already used in this folder.";
@@ -511,8 +522,6 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct()
     for (const QString& answer : answers) {
         if (command == QStringLiteral("Delete"))
             asker.scriptConfirm(answer == QLatin1String("yes"));
-        else if (command == QStringLiteral("Move To…"))
-            asker.scriptItem(answer);
         else
             asker.scriptText(answer);
     }
@@ -832,7 +841,7 @@ void tst_DirEntryBrowser::readOnlyStoreDisablesEditing()
     browser.widget.treeView()->setFocus();
 
     QCOMPARE(browser.widget.isWritable(), writable);
-    for (const QString& text : {"New Job Template", "New Folder…", "Rename…", "Move To…", "Delete"}) {
+    for (const char* text : {"New Job Template", "New Folder…", "Rename…", "Move To…", "Delete"}) {
         QAction* action = text == QLatin1String("New Job Template") ? browser.widget.actionNew() : browser.action(text);
         QVERIFY2(action && action->isEnabled() == writable, qPrintable(text));
     }
@@ -842,6 +851,386 @@ void tst_DirEntryBrowser::readOnlyStoreDisablesEditing()
     QTest::keyClick(QApplication::focusWidget(), Qt::Key_Delete);
     QCOMPARE(asker.asked().size(), writable ? 1 : 0);
     QFile::setPermissions(store.folder(), permissions);
+}
+
+namespace {
+
+// The picker's rows as "name[child, child]", top-level rows joined by ", ".
+QString pickerRows(const QAbstractItemModel* model, const QModelIndex& parent = {})
+{
+    QStringList rows;
+    for (int row = 0; row < model->rowCount(parent); ++row) {
+        const QModelIndex index = model->index(row, 0, parent);
+        const QString children = pickerRows(model, index);
+        rows << index.data().toString() + (children.isEmpty() ? QString() : QLatin1Char('[') + children + QLatin1Char(']'));
+    }
+    return rows.join(QStringLiteral(", "));
+}
+
+// The row reached through the names of path, from the top.
+QModelIndex pickerRow(const QAbstractItemModel* model, const QStringList& path)
+{
+    QModelIndex current;
+    for (const QString& name : path) {
+        const QModelIndexList found =
+            model->match(model->index(0, 0, current), Qt::DisplayRole, name, 1, Qt::MatchExactly);
+        if (found.isEmpty())
+            return {};
+        current = found.first();
+    }
+    return current;
+}
+
+QStringList pathOf(const QModelIndex& index)
+{
+    QStringList path;
+    for (QModelIndex at = index; at.isValid(); at = at.parent())
+        path.prepend(at.data().toString());
+    return path;
+}
+
+// What a test saw of the picker that it answered.
+struct PickerSeen
+{
+    bool appeared = false;
+    QString title;
+    QString rows;
+    QStringList preselected;
+    bool okEnabled = false;
+    bool stayedOpen = false;
+};
+
+// Answers the next modal dialog, which must be a TreePickerDialog: chooses the
+// row at path with Enter or a double-click, or cancels when path is empty.
+void answerNextPicker(PickerSeen* seen, const QStringList& path, bool doubleClick = false)
+{
+    ModalAnswer::actOnNextModal([seen, path, doubleClick](QWidget* modal) {
+        auto* picker = qobject_cast<TreePickerDialog*>(modal);
+        if (!picker) {
+            modal->close();
+            return;
+        }
+        QTreeView* view = picker->view();
+        seen->appeared = true;
+        seen->title = picker->windowTitle();
+        seen->rows = pickerRows(view->model());
+        seen->preselected = pathOf(view->currentIndex());
+        const QModelIndex row = pickerRow(view->model(), path);
+        if (!row.isValid()) {
+            picker->reject();
+            return;
+        }
+        view->scrollTo(row);
+        view->setCurrentIndex(row);
+        seen->okEnabled = picker->findChild<QDialogButtonBox*>()->button(QDialogButtonBox::Ok)->isEnabled();
+        if (doubleClick) {
+            // As a mouse sends it: a click, then the second press as a double-click.
+            const QPoint at = view->visualRect(row).center();
+            QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, at);
+            QTest::mouseDClick(view->viewport(), Qt::LeftButton, {}, at);
+        } else
+            QTest::keyClick(view, Qt::Key_Return);
+        seen->stayedOpen = picker->isVisible();
+        if (seen->stayedOpen)
+            picker->reject();
+    });
+}
+
+// The folders that hold node, from the top.
+QStringList folderPath(const Browser& browser, const Node* node)
+{
+    QStringList path;
+    for (const std::string& folder : browser.model.pathOf(node->parent()))
+        path << QString::fromStdString(folder);
+    return path;
+}
+
+QStringList selectedNames(const Browser& browser)
+{
+    QStringList names;
+    for (const QModelIndex& index : browser.widget.treeView()->selectionModel()->selectedRows())
+        names << browser.model.nodeFromIndex(index)->displayName();
+    return names;
+}
+
+} // namespace
+
+void tst_DirEntryBrowser::openPickerTellsPlacesApart_data()
+{
+    QTest::addColumn<QStringList>("path");
+    QTest::addColumn<bool>("doubleClick");
+    QTest::addColumn<QString>("openedIn");
+    QTest::newRow("the template in the folder, chosen with Enter")
+        << QStringList{"Door A", "B 3/4"} << false << "Door A";
+    QTest::newRow("the template whose name looks like that path, chosen with a double-click")
+        << QStringList{"Door A/B 3/4"} << true << QString();
+    QTest::newRow("a folder is no choice: Enter leaves the picker open") << QStringList{"Door A"} << false << "-";
+}
+
+void tst_DirEntryBrowser::openPickerTellsPlacesApart()
+{
+    QFETCH(QStringList, path);
+    QFETCH(bool, doubleClick);
+    QFETCH(QString, openedIn);
+    TempStore store;
+    storeTemplate(store, "B 3/4", createFolder(store, "Door A"));
+    storeTemplate(store, "Door A/B 3/4", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("B 3/4")));
+
+    PickerSeen seen;
+    answerNextPicker(&seen, path, doubleClick);
+    browser.widget.actionOpen()->trigger();
+
+    QVERIFY(seen.appeared);
+    QCOMPARE(seen.rows, QStringLiteral("Door A[B 3/4], Door A/B 3/4"));
+    const bool choosable = openedIn != QLatin1String("-");
+    QCOMPARE(seen.okEnabled, choosable);
+    QCOMPARE(seen.stayedOpen, !choosable);
+    if (!choosable) {
+        QVERIFY(selectedNames(browser).isEmpty());
+        return;
+    }
+    QCOMPARE(selectedNames(browser), QStringList{path.last()});
+    Node* opened = browser.model.nodeFromIndex(browser.widget.treeView()->currentIndex());
+    QCOMPARE(opened->parent()->displayName(), openedIn);
+    QTRY_VERIFY(opened->object());
+}
+
+// A name far wider than the screen must neither widen the dialog past the
+// screen nor push its buttons out of reach.
+void tst_DirEntryBrowser::pickerWithLongNameFitsTheScreen()
+{
+    const QString longName = QStringLiteral("Door Panel Left ").repeated(20) + QStringLiteral("End of a long name");
+    QCOMPARE(longName.size(), 338);
+    TempStore store;
+    storeTemplate(store, longName.toStdString(), createFolder(store, "Interior"));
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(longName));
+
+    QRect frame;
+    QRect available;
+    bool buttonsInside = false;
+    QString tooltip;
+    bool nameElided = false;
+    ModalAnswer::actOnNextModal([&](QWidget* modal) {
+        auto* picker = qobject_cast<TreePickerDialog*>(modal);
+        if (!picker) {
+            modal->close();
+            return;
+        }
+        frame = picker->frameGeometry();
+        available = picker->screen()->availableGeometry();
+        auto* buttons = picker->findChild<QDialogButtonBox*>();
+        buttonsInside = picker->rect().contains(QRect(buttons->mapTo(picker, QPoint()), buttons->size()));
+        QTreeView* view = picker->view();
+        const QModelIndex row = pickerRow(view->model(), {"Interior", longName});
+        view->scrollTo(row);
+        tooltip = row.data(Qt::ToolTipRole).toString();
+        const QRect cell = view->visualRect(row);
+        nameElided = cell.right() <= view->viewport()->width()
+            && view->fontMetrics().horizontalAdvance(longName) > cell.width();
+        picker->reject();
+    });
+    browser.widget.actionOpen()->trigger();
+
+    QVERIFY(!frame.isEmpty());
+    QVERIFY2(available.contains(frame), qPrintable(QStringLiteral("dialog %1 px wide at %2, screen %3 px")
+                                                       .arg(frame.width()).arg(frame.x()).arg(available.width())));
+    QVERIFY(buttonsInside);
+    QCOMPARE(tooltip, longName);
+    QVERIFY(nameElided);
+}
+
+void tst_DirEntryBrowser::movePickerOffersOnlyPlacesToGo_data()
+{
+    QTest::addColumn<QStringList>("moving");
+    QTest::addColumn<QString>("offered");
+    QTest::addColumn<QStringList>("preselected");
+    QTest::addColumn<QStringList>("target");
+    QTest::addColumn<QStringList>("movedTo");
+    // The store holds Interior (with Doors and the template Door Panel), Trim
+    // and the template Dashboard at the top level.
+    const QString everyFolder = QStringLiteral("(top level)[Interior[Doors], Trim]");
+    QTest::newRow("a template starts at its folder and goes to another")
+        << QStringList{"Door Panel"} << everyFolder << QStringList{"(top level)", "Interior"}
+        << QStringList{"(top level)", "Trim"} << QStringList{"Trim"};
+    QTest::newRow("a template at the top level goes into a sub-folder")
+        << QStringList{"Dashboard"} << everyFolder << QStringList{"(top level)"}
+        << QStringList{"(top level)", "Interior", "Doors"} << QStringList{"Interior", "Doors"};
+    QTest::newRow("a folder is not offered, nor anything inside it")
+        << QStringList{"Interior"} << QStringLiteral("(top level)[Trim]") << QStringList{"(top level)"}
+        << QStringList{"(top level)", "Trim"} << QStringList{"Trim"};
+    QTest::newRow("a template and a folder go together to the top level")
+        << QStringList{"Door Panel", "Doors"} << QStringLiteral("(top level)[Interior, Trim]")
+        << QStringList{"(top level)", "Interior"} << QStringList{"(top level)"} << QStringList{};
+}
+
+void tst_DirEntryBrowser::movePickerOffersOnlyPlacesToGo()
+{
+    QFETCH(QStringList, moving);
+    QFETCH(QString, offered);
+    QFETCH(QStringList, preselected);
+    QFETCH(QStringList, target);
+    QFETCH(QStringList, movedTo);
+    TempStore store;
+    const std::string interior = createFolder(store, "Interior");
+    createFolder(store, "Doors", interior);
+    createFolder(store, "Trim");
+    storeTemplate(store, "Door Panel", interior);
+    storeTemplate(store, "Dashboard", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")) && browser.find(QStringLiteral("Doors")));
+    QTreeView* tree = browser.widget.treeView();
+    tree->collapseAll();
+    for (const QString& name : moving)
+        tree->selectionModel()->select(browser.model.indexFromNode(browser.find(name)), QItemSelectionModel::Select);
+
+    PickerSeen seen;
+    answerNextPicker(&seen, target);
+    browser.action(QStringLiteral("Move To…"))->trigger();
+
+    QVERIFY(seen.appeared);
+    QCOMPARE(seen.rows, offered);
+    QCOMPARE(seen.preselected, preselected);
+    QVERIFY(!seen.stayedOpen);
+    // Each moved node lands in the folder chosen and is selected, its folder open.
+    for (const QString& name : moving)
+        QTRY_COMPARE(folderPath(browser, browser.find(name)), movedTo);
+    QStringList nowSelected = selectedNames(browser);
+    nowSelected.sort();
+    moving.sort();
+    QCOMPARE(nowSelected, moving);
+    for (const QString& name : moving) {
+        const QModelIndex folder = browser.model.indexFromNode(browser.find(name)->parent());
+        QVERIFY(!folder.isValid() || tree->isExpanded(folder));
+    }
+    Browser restarted(store);
+    for (const QString& name : moving) {
+        QTRY_VERIFY(restarted.find(name));
+        QCOMPARE(folderPath(restarted, restarted.find(name)), movedTo);
+    }
+}
+
+void tst_DirEntryBrowser::entryDeletedElsewhereIsSaidAndRemoved_data()
+{
+    QTest::addColumn<QString>("deletedBy");
+    QTest::newRow("another browser on the same store") << "browser";
+    QTest::newRow("another program writing the store file") << "program";
+}
+
+void tst_DirEntryBrowser::entryDeletedElsewhereIsSaidAndRemoved()
+{
+    QFETCH(QString, deletedBy);
+    TempStore store;
+    const std::string interior = createFolder(store, "Interior");
+    storeTemplate(store, "Door Panel", interior);
+    storeTemplate(store, "Dashboard", interior);
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
+    QVERIFY(browser.openLoaded(QStringLiteral("Dashboard")));
+    if (deletedBy == QLatin1String("browser")) {
+        Browser other(store);
+        QTRY_VERIFY(other.find(QStringLiteral("Door Panel")));
+        bool deleted = false;
+        other.model.deleteNodes({other.find(QStringLiteral("Door Panel"))}, [&deleted](bool ok) { deleted = ok; });
+        QTRY_VERIFY(deleted);
+    } else {
+        RawConnection raw(store.path());
+        QVERIFY(raw.exec(QStringLiteral("DELETE FROM dir_entries WHERE object_id IN "
+                                        "(SELECT id FROM objects WHERE name = 'Door Panel')")));
+        QVERIFY(raw.exec(QStringLiteral("DELETE FROM objects WHERE name = 'Door Panel'")));
+    }
+    QSignalSpy selections(&browser.widget, &DirEntryBrowserWidget::sgSelectionChanged);
+
+    browser.select(browser.find(QStringLiteral("Door Panel")));
+
+    QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
+    const QString message = browser.widget.findChild<QMessageBox*>()->text();
+    QVERIFY2(message.contains(QStringLiteral("\"Door Panel\"")) && message.contains(QStringLiteral("deleted elsewhere")),
+             qPrintable(message));
+    QVERIFY2(!message.contains(QStringLiteral("no stored object")), qPrintable(message));
+    QTRY_VERIFY(!browser.find(QStringLiteral("Door Panel")));
+    QVERIFY(browser.find(QStringLiteral("Dashboard")));
+    QVERIFY(browser.widget.treeView()->isExpanded(browser.model.indexFromNode(browser.find(QStringLiteral("Interior")))));
+    QTRY_VERIFY(!selections.isEmpty());
+    QVERIFY(selections.last().first().value<QVector<Node*>>().isEmpty());
+}
+
+void tst_DirEntryBrowser::refreshKeepsOpenFoldersAndSelection_data()
+{
+    QTest::addColumn<QStringList>("selected");
+    QTest::addColumn<QStringList>("expanded");
+    // The store holds Interior with Doors (holding Door Panel), Trim (holding
+    // Moulding) and the template Dashboard at the top level.
+    QTest::newRow("a template deep in open folders")
+        << QStringList{"Door Panel"} << QStringList{"Interior", "Doors"};
+    QTest::newRow("a folder, its parent closed")
+        << QStringList{"Trim"} << QStringList{};
+    QTest::newRow("two templates in different folders")
+        << QStringList{"Dashboard", "Moulding"} << QStringList{"Trim"};
+    QTest::newRow("a sub-folder open inside a closed folder")
+        << QStringList{} << QStringList{"Doors"};
+}
+
+void tst_DirEntryBrowser::refreshKeepsOpenFoldersAndSelection()
+{
+    QFETCH(QStringList, selected);
+    QFETCH(QStringList, expanded);
+    TempStore store;
+    const std::string interior = createFolder(store, "Interior");
+    const std::string doors = createFolder(store, "Doors", interior);
+    const std::string trim = createFolder(store, "Trim");
+    storeTemplate(store, "Door Panel", doors);
+    storeTemplate(store, "Moulding", trim);
+    storeTemplate(store, "Dashboard", "");
+    Browser browser(store);
+    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")) && browser.find(QStringLiteral("Moulding")));
+    QTreeView* tree = browser.widget.treeView();
+    tree->collapseAll();
+    for (const QString& name : expanded)
+        tree->expand(browser.model.indexFromNode(browser.find(name)));
+    for (const QString& name : selected)
+        tree->selectionModel()->select(browser.model.indexFromNode(browser.find(name)), QItemSelectionModel::Select);
+    QTRY_COMPARE(selectedNames(browser).size(), selected.size());
+    // Something new in the store shows that the tree was read again.
+    storeTemplate(store, "Bumper", "");
+
+    browser.widget.refresh();
+
+    QTRY_VERIFY(browser.find(QStringLiteral("Bumper")));
+    QStringList nowExpanded;
+    for (Node* node : browser.model.descendants(browser.model.root())) {
+        if (node->isFolder() && tree->isExpanded(browser.model.indexFromNode(node)))
+            nowExpanded << node->displayName();
+    }
+    QStringList expectedExpanded = expanded;
+    // Selecting a node opens the folders above it.
+    for (const QString& name : selected) {
+        for (Node* parent = browser.find(name)->parent(); parent != browser.model.root(); parent = parent->parent()) {
+            if (!expectedExpanded.contains(parent->displayName()))
+                expectedExpanded << parent->displayName();
+        }
+    }
+    nowExpanded.sort();
+    expectedExpanded.sort();
+    QCOMPARE(nowExpanded, expectedExpanded);
+    QStringList nowSelected = selectedNames(browser);
+    nowSelected.sort();
+    selected.sort();
+    QCOMPARE(nowSelected, selected);
+}
+
+void tst_DirEntryBrowser::namesSortAsPeopleRead()
+{
+    TempStore store;
+    for (const char* name : {"Part 10", "part 2", "Ärmel", "Zierleiste", "Öse"})
+        storeTemplate(store, name, "");
+    createFolder(store, "Zubehör");
+    Browser browser(store);
+
+    QTRY_COMPARE(browser.namesIn(nullptr),
+                 (QStringList{"Zubehör", "Ärmel", "Öse", "part 2", "Part 10", "Zierleiste"}));
 }
 
 QC_TEST_MAIN(tst_DirEntryBrowser)
