@@ -23,7 +23,12 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
     headingFont.setBold(true);
     headingFont.setPointSizeF(headingFont.pointSizeF() * 1.3);
     m_heading->setFont(headingFont);
+    // A long name is cut at the pane's edge (the tooltip shows it whole)
+    // instead of widening the window beyond the screen.
+    m_heading->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
+    m_heading->setTextFormat(Qt::PlainText);
     m_summary->setWordWrap(true);
+    m_summary->setTextFormat(Qt::PlainText);
 
     auto* layout = new QVBoxLayout(this);
     layout->addWidget(m_heading);
@@ -38,10 +43,13 @@ void QCJobTemplateDetailWidget::reloadFromModel()
     const auto jobTemplate = m_model->jobTemplate();
     if (!jobTemplate) {
         m_heading->clear();
+        m_heading->setToolTip(QString());
         m_summary->clear();
         return;
     }
-    m_heading->setText(QString::fromStdString(jobTemplate->name()));
+    const QString name = QString::fromStdString(jobTemplate->name());
+    m_heading->setText(name);
+    m_heading->setToolTip(name);
     const QString description = QString::fromStdString(jobTemplate->description());
     m_summary->setText(tr("%1\n\nCheckpoints: %2")
                            .arg(description.isEmpty() ? tr("No description.") : description,

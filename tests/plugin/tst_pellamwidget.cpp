@@ -54,6 +54,7 @@ private slots:
     void selectionDecidesPageAndTemplate_data();
     void selectionDecidesPageAndTemplate();
     void newTemplateIsNamedAndBecomesModelsTemplate();
+    void longTemplateNameKeepsTheWindowNarrow();
     void editorModificationReachesBrowser();
 
 private:
@@ -235,6 +236,23 @@ void tst_PellamWidget::newTemplateIsNamedAndBecomesModelsTemplate()
     browser->actionNew()->trigger();
     QCOMPARE(browser->treeModel()->rowCount(), 2);
     QCOMPARE(browser->treeModel()->root()->children().back()->displayName(), QStringLiteral("Job Template 2"));
+}
+
+void tst_PellamWidget::longTemplateNameKeepsTheWindowNarrow()
+{
+    auto opened = std::make_shared<QCJobTemplate>();
+    opened->setName(QString(QStringLiteral("Left Inner Trim Gloss Check ")).repeated(12).toStdString());
+    auto node = entryNodeHolding(opened);
+    m_host->show();
+    const int before = m_widget->minimumSizeHint().width();
+    select({node.get()});
+
+    QCOMPARE(pages()->currentIndex(), 1);
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::LayoutRequest);
+    // The heading is cut at the pane's edge rather than widening the tab.
+    QCOMPARE(m_widget->minimumSizeHint().width(), before);
+    QCOMPARE(m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->toolTip(),
+             QString::fromStdString(opened->name()));
 }
 
 void tst_PellamWidget::editorModificationReachesBrowser()
