@@ -2,17 +2,22 @@
 
 #include <QApplication>
 #include <QCoreApplication>
+#include <QSettings>
 #include <QStandardPaths>
+#include <QTemporaryDir>
 #include <QtTest>
 
 // Runs a test the same inside and outside CTest: offscreen unless the caller
-// names a platform, and with settings and data folders of its own, so that a
-// test never touches the user's settings or stores.
+// names a platform, with data folders of its own and settings in a folder of
+// this run alone, so that a test never touches the user's settings or stores,
+// nor another run of the same test.
 inline void prepareTestEnvironment()
 {
     if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
         qputenv("QT_QPA_PLATFORM", "offscreen");
     QStandardPaths::setTestModeEnabled(true);
+    static QTemporaryDir settingsFolder;
+    QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope, settingsFolder.path());
 }
 
 #define QC_TEST_MAIN(TestObject)                                                                   \
