@@ -1,5 +1,7 @@
 #include "app/sampledata/LabToScreen.h"
 
+#include "host/domain/ColorimetricCondition.h"
+
 #include <lcms2.h>
 
 #include <algorithm>
@@ -7,10 +9,28 @@
 
 namespace vemi {
 
-std::unique_ptr<LabToScreen> LabToScreen::create()
+namespace {
+
+// Chromaticities of the illuminants' whites for the 2 degree observer.
+bool whiteOf(const std::string& illuminant, cmsCIExyY* white)
 {
-    const cmsCIExyY d65 = {0.3127, 0.3290, 1.0};
-    cmsHPROFILE lab = cmsCreateLab4Profile(&d65);
+    if (illuminant == "D50")
+        *white = {0.3457, 0.3585, 1.0};
+    else if (illuminant == "D65")
+        *white = {0.3127, 0.3290, 1.0};
+    else
+        return false;
+    return true;
+}
+
+} // namespace
+
+std::unique_ptr<LabToScreen> LabToScreen::create(const ColorimetricCondition& condition)
+{
+    cmsCIExyY white;
+    if (!whiteOf(condition.illuminant(), &white))
+        return nullptr;
+    cmsHPROFILE lab = cmsCreateLab4Profile(&white);
     cmsHPROFILE srgb = cmsCreate_sRGBProfile();
     cmsHTRANSFORM transform = nullptr;
     if (lab && srgb)

@@ -6,14 +6,19 @@
 
 namespace vemi {
 
-// Lab (D65 white) to 8-bit sRGB through Little CMS. Relative colorimetric
-// intent maps the Lab white onto the screen white; the 8-bit output clips
-// colours outside the sRGB gamut channel by channel.
+class ColorimetricCondition;
+
+// Lab to 8-bit sRGB through Little CMS, for Lab values whose white is that of
+// one illuminant. Relative colorimetric intent maps the Lab white onto the
+// screen white; the 8-bit output clips colours outside the sRGB gamut channel
+// by channel.
 class LabToScreen
 {
 public:
-    // Null when Little CMS cannot build the transform.
-    static std::unique_ptr<LabToScreen> create();
+    // For Lab values under the condition's illuminant, D50 or D65; the white is
+    // taken for the 2 degree observer, the one sRGB is defined for. Null for
+    // another illuminant or when Little CMS cannot build the transform.
+    static std::unique_ptr<LabToScreen> create(const ColorimetricCondition& condition);
 
     ~LabToScreen();
     LabToScreen(const LabToScreen&) = delete;

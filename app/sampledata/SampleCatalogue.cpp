@@ -1,11 +1,13 @@
 #include "app/sampledata/SampleCatalogue.h"
 
+#include "app/sampledata/LabToScreen.h"
+#include "app/sampledata/SampleChart.h"
+#include "app/sampledata/SampleDrawings.h"
 #include "host/domain/AppearanceValues.h"
 #include "host/domain/CheckPoint.h"
 #include "host/domain/CheckPointCouple.h"
 #include "host/domain/ColorStandardsLibrary.h"
 #include "host/domain/ColorimetricCondition.h"
-#include "app/sampledata/LabToScreen.h"
 #include "host/domain/LabToleranceBase.h"
 #include "host/domain/LabValue.h"
 #include "host/domain/MeasurementConfiguration.h"
@@ -15,7 +17,6 @@
 #include "host/domain/PropertyLibrary.h"
 #include "host/domain/QCJobTemplate.h"
 #include "host/domain/RGBValue.h"
-#include "app/sampledata/SampleDrawings.h"
 #include "host/domain/SchematicImage.h"
 #include "host/domain/Size.h"
 #include "host/domain/Standard.h"
@@ -24,6 +25,7 @@
 #include "host/domain/ToleranceSet.h"
 
 #include <QBuffer>
+#include <QString>
 #include <QImage>
 #include <QRect>
 
@@ -56,7 +58,7 @@ const std::array<StandardPlan, SampleColourCount> kStandardPlans = {{
 std::shared_ptr<Standard> makeStandard(const StandardPlan& plan, const LabToScreen& toScreen)
 {
     auto lab = std::make_shared<LabValue>(plan.L, plan.a, plan.b);
-    lab->setColorimetricCondition(ColorimetricCondition().toString());
+    lab->setColorimetricCondition(ColorimetricCondition("D65", "10").toString());
     auto appearance = std::make_shared<AppearanceValues>();
     appearance->setColorValues({lab});
 
@@ -69,32 +71,65 @@ std::shared_ptr<Standard> makeStandard(const StandardPlan& plan, const LabToScre
     return standard;
 }
 
+// A definition with allowed values offers the first as its default; a free
+// text definition has a default only when one is given.
 std::shared_ptr<TagDefinition> makeTagDefinition(const char* name, const char* description,
-                                                 const std::vector<std::string>& allowedValues = {})
+                                                 const std::vector<std::string>& allowedValues = {},
+                                                 const char* defaultValue = "")
 {
     auto definition = std::make_shared<TagDefinition>();
     definition->setName(name);
     definition->setDescription(description);
     definition->setAllowedValues(allowedValues);
-    if (!allowedValues.empty())
-        definition->setDefaultValue(allowedValues.front());
+    definition->setDefaultValue(allowedValues.empty() ? defaultValue : allowedValues.front());
     return definition;
 }
 
-std::shared_ptr<ToleranceSet> makeToleranceSet()
+std::vector<std::shared_ptr<TagDefinition>> makeInspectionDefinitions()
+{
+    return {makeTagDefinition("Inspector", "Name of the person who measured the part."),
+            makeTagDefinition("Shift", "Production shift the part comes from.", {"Early", "Late", "Night"}),
+            makeTagDefinition("Light Booth", "Light used for the visual check beside the measurement.",
+                              {"D65", "TL84", "A"}),
+            makeTagDefinition("Parts per Lot", "How many parts of a lot are measured.", {}, "3"),
+            makeTagDefinition("Remarks", "Anything the inspector noticed.")};
+}
+
+// The formula names the store's tolerances use: "dE2000", "dECMC(2:1)"
+// (lightness to chroma weight 2:1) and "dE*ab".
+struct TolerancePlan
+{
+    const char* setName;
+    const char* description;
+    const char* method;
+    double limit;
+    const char* illuminant;
+    const char* observer;
+};
+
+std::shared_ptr<ToleranceSet> makeToleranceSet(const TolerancePlan& plan)
 {
     auto tolerance = std::make_shared<LabToleranceBase>();
-    tolerance->setName("dE2000 1.0");
-    tolerance->setMethod("dE2000");
-    tolerance->setLimit(1.0);
-    tolerance->setColorimetricCondition(std::make_shared<ColorimetricCondition>("D65", "10"));
+    tolerance->setName(std::string(plan.method) + ' ' + QString::number(plan.limit, 'f', 1).toStdString());
+    tolerance->setMethod(plan.method);
+    tolerance->setLimit(plan.limit);
+    tolerance->setColorimetricCondition(std::make_shared<ColorimetricCondition>(plan.illuminant, plan.observer));
 
     auto set = std::make_shared<ToleranceSet>();
-    set->setName("Automotive Interior");
-    set->setDescription("Acceptance limit for visible interior trim parts.");
+    set->setName(plan.setName);
+    set->setDescription(plan.description);
     set->setTolerances({tolerance});
     return set;
 }
+
+const TolerancePlan kInteriorTolerance = {"Automotive Interior", "Acceptance limit for visible interior trim parts.",
+                                          "dE2000", 1.0, "D65", "10"};
+
+const std::array<TolerancePlan, 3> kOtherTolerances = {{
+    {"Seat Fabric CMC", "Acceptance limit for woven seat and headliner fabrics.", "dECMC(2:1)", 1.2, "D65", "10"},
+    {"Chart Check", "Agreement of a measured chart with its published values.", "dE2000", 1.5, "D50", "2"},
+    {"Printed Labels", "Acceptance limit for printed warning and information labels.", "dE*ab", 3.0, "D50", "2"},
+}};
 
 std::shared_ptr<MeasurementConfiguration> makeMeasurementConfiguration()
 {
@@ -273,39 +308,65 @@ std::shared_ptr<QCJobTemplate> makeTemplate(const TemplatePlan& plan, const Samp
 
 } // namespace
 
-SampleCatalogue::Samples SampleCatalogue::samples(const LabToScreen& toScreen)
+SampleCatalogue::Samples SampleCatalogue::samples(const LabToScreen& d65ToScreen, const LabToScreen& d50ToScreen)
 {
     Samples samples;
     for (int colour = 0; colour < SampleColourCount; ++colour) {
-        samples.standards[colour] = makeStandard(kStandardPlans[colour], toScreen);
+        samples.standards[colour] = makeStandard(kStandardPlans[colour], d65ToScreen);
         const auto rgb = samples.standards[colour]->displayRGB();
         samples.colours[colour] = QColor(rgb->red(), rgb->green(), rgb->blue());
     }
+    samples.chartStandards = SampleChart::standards(d50ToScreen);
     samples.tagDefinitions = {makeTagDefinition("Supplier", "Company that supplies the part."),
                               makeTagDefinition("Part Number", "Drawing number of the part."),
                               makeTagDefinition("Material", "Base material of the measured surface.",
                                                 {"PP-T20", "PC/ABS", "ABS", "TPO"})};
-    samples.toleranceSet = makeToleranceSet();
+    samples.inspectionDefinitions = makeInspectionDefinitions();
+    samples.toleranceSet = makeToleranceSet(kInteriorTolerance);
+    for (const TolerancePlan& plan : kOtherTolerances)
+        samples.otherToleranceSets.push_back(makeToleranceSet(plan));
     samples.configuration = makeMeasurementConfiguration();
     return samples;
 }
 
-std::shared_ptr<ColorStandardsLibrary> SampleCatalogue::standardsLibrary(const Samples& samples)
+std::vector<std::shared_ptr<ColorStandardsLibrary>> SampleCatalogue::standardsLibraries(const Samples& samples)
 {
-    auto library = std::make_shared<ColorStandardsLibrary>();
-    library->setName("Interior Colours");
-    library->setDescription("Standard colours of the interior trim programme.");
-    library->setStandards({samples.standards.begin(), samples.standards.end()});
-    return library;
+    auto interior = std::make_shared<ColorStandardsLibrary>();
+    interior->setName("Interior Colours");
+    interior->setDescription("Standard colours of the interior trim programme, D65/10.");
+    interior->setStandards({samples.standards.begin(), samples.standards.end()});
+
+    auto chart = std::make_shared<ColorStandardsLibrary>();
+    chart->setName("Colour Chart 24");
+    chart->setDescription("The 24 patches of the colour rendition chart, D50/2.");
+    chart->setStandards(samples.chartStandards);
+
+    auto greys = std::make_shared<ColorStandardsLibrary>();
+    greys->setName("Chart Grey Scale");
+    greys->setDescription("The six neutral patches of the colour rendition chart, D50/2.");
+    greys->setStandards({samples.chartStandards.begin() + SampleChart::kFirstGrey, samples.chartStandards.end()});
+    return {interior, chart, greys};
 }
 
-std::shared_ptr<PropertyLibrary> SampleCatalogue::propertyLibrary(const Samples& samples)
+std::vector<std::shared_ptr<PropertyLibrary>> SampleCatalogue::propertyLibraries(const Samples& samples)
 {
-    auto properties = std::make_shared<PropertyLibrary>();
-    properties->setName("Part Properties");
-    properties->setDescription("What a QC job records about the part it checks.");
-    properties->setProperties(samples.tagDefinitions);
-    return properties;
+    auto part = std::make_shared<PropertyLibrary>();
+    part->setName("Part Properties");
+    part->setDescription("What a QC job records about the part it checks.");
+    part->setProperties(samples.tagDefinitions);
+
+    auto inspection = std::make_shared<PropertyLibrary>();
+    inspection->setName("Inspection Properties");
+    inspection->setDescription("What a QC job records about how the part was checked.");
+    inspection->setProperties(samples.inspectionDefinitions);
+    return {part, inspection};
+}
+
+std::vector<std::shared_ptr<ToleranceSet>> SampleCatalogue::toleranceSets(const Samples& samples)
+{
+    std::vector<std::shared_ptr<ToleranceSet>> sets = {samples.toleranceSet};
+    sets.insert(sets.end(), samples.otherToleranceSets.begin(), samples.otherToleranceSets.end());
+    return sets;
 }
 
 std::vector<std::shared_ptr<QCJobTemplate>> SampleCatalogue::jobTemplates(const Samples& samples)

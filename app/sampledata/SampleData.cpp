@@ -2,6 +2,7 @@
 
 #include "app/sampledata/LabToScreen.h"
 #include "app/sampledata/SampleCatalogue.h"
+#include "host/domain/ColorimetricCondition.h"
 #include "host/domain/ColorStandardsLibrary.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/PropertyLibrary.h"
@@ -24,6 +25,7 @@ namespace {
 constexpr int kAnswerTimeoutMs = 30000;
 
 const char* const kSamplesFolder = "Samples";
+const char* const kChartFolder = "Colour Chart";
 const char* const kTemplatesFolder = "Sample Job Templates";
 
 // Files objects of one type in a top-level folder of their own.
@@ -36,29 +38,40 @@ void addAll(FillEmptyStore& set, const std::string& objectType, const char* fold
 }
 
 template <class Object>
+void addAll(FillEmptyStore& set, const char* folderName, const std::vector<std::shared_ptr<Object>>& objects)
+{
+    addAll(set, Object::typeId(), folderName, objects);
+}
+
+template <class Object>
 void addOne(FillEmptyStore& set, const char* folderName, const std::shared_ptr<Object>& object)
 {
-    addAll(set, Object::typeId(), folderName, std::vector<std::shared_ptr<Object>>{object});
+    addAll(set, folderName, std::vector<std::shared_ptr<Object>>{object});
 }
 
 } // namespace
 
 std::shared_ptr<FillEmptyStore> SampleData::buildSet(QString* error)
 {
-    const auto toScreen = LabToScreen::create();
-    if (!toScreen) {
+    const auto d65ToScreen = LabToScreen::create(ColorimetricCondition("D65", "2"));
+    const auto d50ToScreen = LabToScreen::create(ColorimetricCondition("D50", "2"));
+    if (!d65ToScreen || !d50ToScreen) {
         *error = QStringLiteral("Cannot compute the display colours of the sample standards: "
                                 "Little CMS could not create the Lab to sRGB transform.");
         return nullptr;
     }
-    const SampleCatalogue::Samples samples = SampleCatalogue::samples(*toScreen);
+    const SampleCatalogue::Samples samples = SampleCatalogue::samples(*d65ToScreen, *d50ToScreen);
 
+    // Libraries refer to their members, so the members are written first.
     auto set = std::make_shared<FillEmptyStore>("store the sample data");
     addAll(*set, Standard::typeId(), kSamplesFolder, samples.standards);
-    addOne(*set, kSamplesFolder, SampleCatalogue::standardsLibrary(samples));
-    addAll(*set, TagDefinition::typeId(), kSamplesFolder, samples.tagDefinitions);
-    addOne(*set, kSamplesFolder, SampleCatalogue::propertyLibrary(samples));
-    addOne(*set, kSamplesFolder, samples.toleranceSet);
+    addAll(*set, Standard::typeId(), kChartFolder, samples.chartStandards);
+    addAll(*set, kSamplesFolder, SampleCatalogue::standardsLibraries(samples));
+    std::vector<std::shared_ptr<TagDefinition>> definitions = samples.tagDefinitions;
+    definitions.insert(definitions.end(), samples.inspectionDefinitions.begin(), samples.inspectionDefinitions.end());
+    addAll(*set, kSamplesFolder, definitions);
+    addAll(*set, kSamplesFolder, SampleCatalogue::propertyLibraries(samples));
+    addAll(*set, kSamplesFolder, SampleCatalogue::toleranceSets(samples));
     addOne(*set, kSamplesFolder, samples.configuration);
     addAll(*set, QCJobTemplate::typeId(), kTemplatesFolder, SampleCatalogue::jobTemplates(samples));
     return set;

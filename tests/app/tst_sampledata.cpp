@@ -7,6 +7,7 @@
 #include "host/domain/CheckPoint.h"
 #include "host/domain/CheckPointCouple.h"
 #include "host/domain/ColorStandardsLibrary.h"
+#include "host/domain/ColorimetricCondition.h"
 #include "host/store/CommandSender.h"
 #include "host/store/CreateFolder.h"
 #include "host/domain/DirEntry.h"
@@ -17,6 +18,7 @@
 #include "host/store/GetDirectoryTree.h"
 #include "host/store/GetMarloObjects.h"
 #include "host/store/GetMarloObjectsResponse.h"
+#include "host/domain/LabToleranceBase.h"
 #include "host/domain/LabValue.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/Position.h"
@@ -82,6 +84,29 @@ QString describe(const Rows& rows)
     return QStringLiteral("%1 folders, %2 objects, %3 entries").arg(rows.folders).arg(rows.objects).arg(rows.entries);
 }
 
+template <class T>
+std::shared_ptr<T> fetchNamed(TempStore& store, const QString& name, int depth = 1)
+{
+    for (const auto& object : fetchAll<T>(store, depth)) {
+        if (object && object->name() == name.toStdString())
+            return object;
+    }
+    return nullptr;
+}
+
+std::shared_ptr<LabValue> firstLab(const Standard& standard)
+{
+    const auto appearance = standard.appearanceValues(0);
+    if (!appearance || appearance->colorValues().empty())
+        return nullptr;
+    return std::dynamic_pointer_cast<LabValue>(appearance->colorValues().front());
+}
+
+std::shared_ptr<LabToleranceBase> firstLabTolerance(const ToleranceSet& set)
+{
+    return set.tolerances().empty() ? nullptr : std::dynamic_pointer_cast<LabToleranceBase>(set.tolerances().front());
+}
+
 std::shared_ptr<FillEmptyStore> sampleSet()
 {
     QString error;
@@ -109,14 +134,22 @@ class tst_SampleData : public QObject
 
 private slots:
     void initTestCase();
-    void fillsEachTreeInOneFolder_data();
-    void fillsEachTreeInOneFolder();
+    void fillsEachTreeInItsFolders_data();
+    void fillsEachTreeInItsFolders();
     void templatesAreComplete_data();
     void templatesAreComplete();
     void librariesResolveTheirMembers_data();
     void librariesResolveTheirMembers();
+    void chartPatchesKeepPublishedLab_data();
+    void chartPatchesKeepPublishedLab();
     void displayColoursFollowLab_data();
     void displayColoursFollowLab();
+    void toleranceSetsCarryFormulaAndCondition_data();
+    void toleranceSetsCarryFormulaAndCondition();
+    void conditionsOfStandardAndTolerance_data();
+    void conditionsOfStandardAndTolerance();
+    void definitionsWithAndWithoutDefaults_data();
+    void definitionsWithAndWithoutDefaults();
     void secondRunAddsNothing();
     void storeWithAnythingIsLeftAlone_data();
     void storeWithAnythingIsLeftAlone();
@@ -135,36 +168,46 @@ void tst_SampleData::initTestCase()
     QCOMPARE(SampleData::seedIfEmpty(m_seeded->model()), QString());
 }
 
-void tst_SampleData::fillsEachTreeInOneFolder_data()
+void tst_SampleData::fillsEachTreeInItsFolders_data()
 {
     QTest::addColumn<QString>("type");
-    QTest::addColumn<QString>("folder");
+    QTest::addColumn<QStringList>("folders");
     QTest::addColumn<int>("entries");
-    QTest::newRow("job templates") << QString::fromStdString(QCJobTemplate::typeId()) << "Sample Job Templates" << 2;
-    QTest::newRow("standards stored apart from their library")
-        << QString::fromStdString(Standard::typeId()) << "Samples" << 6;
-    QTest::newRow("standards library") << QString::fromStdString(ColorStandardsLibrary::typeId()) << "Samples" << 1;
-    QTest::newRow("tag definitions stored apart from their library")
-        << QString::fromStdString(TagDefinition::typeId()) << "Samples" << 3;
-    QTest::newRow("property library") << QString::fromStdString(PropertyLibrary::typeId()) << "Samples" << 1;
-    QTest::newRow("tolerance set") << QString::fromStdString(ToleranceSet::typeId()) << "Samples" << 1;
+    QTest::newRow("job templates") << QString::fromStdString(QCJobTemplate::typeId())
+                                   << QStringList{"Sample Job Templates"} << 2;
+    QTest::newRow("interior and chart standards stored apart from their libraries")
+        << QString::fromStdString(Standard::typeId()) << QStringList{"Samples", "Colour Chart"} << 6 + 24;
+    QTest::newRow("standards libraries")
+        << QString::fromStdString(ColorStandardsLibrary::typeId()) << QStringList{"Samples"} << 3;
+    QTest::newRow("tag definitions stored apart from their libraries")
+        << QString::fromStdString(TagDefinition::typeId()) << QStringList{"Samples"} << 3 + 5;
+    QTest::newRow("property libraries") << QString::fromStdString(PropertyLibrary::typeId()) << QStringList{"Samples"}
+                                        << 2;
+    QTest::newRow("tolerance sets") << QString::fromStdString(ToleranceSet::typeId()) << QStringList{"Samples"} << 4;
     QTest::newRow("measurement configuration")
-        << QString::fromStdString(MeasurementConfiguration::typeId()) << "Samples" << 1;
+        << QString::fromStdString(MeasurementConfiguration::typeId()) << QStringList{"Samples"} << 1;
 }
 
-void tst_SampleData::fillsEachTreeInOneFolder()
+void tst_SampleData::fillsEachTreeInItsFolders()
 {
     QFETCH(QString, type);
-    QFETCH(QString, folder);
+    QFETCH(QStringList, folders);
     QFETCH(int, entries);
 
     auto response = tree(*m_seeded, type.toStdString());
     QVERIFY(response);
-    QCOMPARE(int(response->folders().size()), 1);
-    QCOMPARE(QString::fromStdString(response->folders().front().name), folder);
+    QStringList names;
+    std::set<std::string> folderIds;
+    for (const auto& folder : response->folders()) {
+        names << QString::fromStdString(folder.name);
+        folderIds.insert(folder.id);
+    }
+    names.sort();
+    folders.sort();
+    QCOMPARE(names, folders);
     QCOMPARE(int(response->entries().size()), entries);
     for (const auto& entry : response->entries())
-        QCOMPARE(entry->folderId(), response->folders().front().id);
+        QVERIFY(folderIds.count(entry->folderId()));
 }
 
 void tst_SampleData::templatesAreComplete_data()
@@ -250,33 +293,80 @@ void tst_SampleData::templatesAreComplete()
 
 void tst_SampleData::librariesResolveTheirMembers_data()
 {
+    const QStringList greys{"White 9.5", "Neutral 8", "Neutral 6.5", "Neutral 5", "Neutral 3.5", "Black 2"};
     QTest::addColumn<bool>("standardsLibrary");
+    QTest::addColumn<QString>("library");
     QTest::addColumn<QStringList>("members");
-    QTest::newRow("standards library") << true
-                                       << QStringList{"Ivory Beige", "Graphite Grey", "Signal Red", "Ocean Blue",
-                                                      "Leaf Green", "Sun Yellow"};
-    QTest::newRow("property library") << false << QStringList{"Supplier", "Part Number", "Material"};
+    QTest::newRow("interior colours") << true << "Interior Colours"
+                                      << QStringList{"Ivory Beige", "Graphite Grey", "Signal Red", "Ocean Blue",
+                                                     "Leaf Green", "Sun Yellow"};
+    QTest::newRow("whole chart in reading order")
+        << true << "Colour Chart 24"
+        << QStringList{"Dark Skin",     "Light Skin",    "Blue Sky", "Foliage", "Blue Flower", "Bluish Green",
+                       "Orange",        "Purplish Blue", "Moderate Red", "Purple", "Yellow Green",
+                       "Orange Yellow", "Blue",          "Green",    "Red",     "Yellow",      "Magenta",
+                       "Cyan"} + greys;
+    QTest::newRow("chart grey scale sharing the chart's standards") << true << "Chart Grey Scale" << greys;
+    QTest::newRow("part properties") << false << "Part Properties" << QStringList{"Supplier", "Part Number", "Material"};
+    QTest::newRow("inspection properties")
+        << false << "Inspection Properties"
+        << QStringList{"Inspector", "Shift", "Light Booth", "Parts per Lot", "Remarks"};
 }
 
 void tst_SampleData::librariesResolveTheirMembers()
 {
     QFETCH(bool, standardsLibrary);
+    QFETCH(QString, library);
     QFETCH(QStringList, members);
 
     // Names come only from the stored members: an unresolved stand-in has none.
     QStringList names;
     if (standardsLibrary) {
-        const auto libraries = fetchAll<ColorStandardsLibrary>(*m_seeded, 2);
-        QCOMPARE(int(libraries.size()), 1);
-        for (const auto& standard : libraries.front()->standards())
+        const auto standards = fetchNamed<ColorStandardsLibrary>(*m_seeded, library, 2);
+        QVERIFY(standards);
+        for (const auto& standard : standards->standards()) {
             names << QString::fromStdString(standard->name());
+            // A resolved member brings its colour along, as the editor's list shows it.
+            QVERIFY2(standard->displayRGB() && firstLab(*standard), qPrintable(names.last()));
+        }
     } else {
-        const auto libraries = fetchAll<PropertyLibrary>(*m_seeded, 2);
-        QCOMPARE(int(libraries.size()), 1);
-        for (const auto& definition : libraries.front()->properties())
+        const auto properties = fetchNamed<PropertyLibrary>(*m_seeded, library, 2);
+        QVERIFY(properties);
+        for (const auto& definition : properties->properties())
             names << QString::fromStdString(definition->name());
     }
     QCOMPARE(names, members);
+}
+
+void tst_SampleData::chartPatchesKeepPublishedLab_data()
+{
+    QTest::addColumn<QString>("name");
+    QTest::addColumn<double>("L");
+    QTest::addColumn<double>("a");
+    QTest::addColumn<double>("b");
+    QTest::newRow("first patch") << "Dark Skin" << 37.54 << 14.37 << 14.92;
+    QTest::newRow("saturated blue") << "Blue" << 28.37 << 15.42 << -49.80;
+    QTest::newRow("cyan, both axes negative") << "Cyan" << 49.57 << -29.71 << -28.32;
+    QTest::newRow("white of the grey scale") << "White 9.5" << 95.19 << -1.03 << 2.93;
+    QTest::newRow("last patch") << "Black 2" << 20.64 << 0.07 << -0.46;
+}
+
+void tst_SampleData::chartPatchesKeepPublishedLab()
+{
+    QFETCH(QString, name);
+    QFETCH(double, L);
+    QFETCH(double, a);
+    QFETCH(double, b);
+
+    const auto standard = fetchNamed<Standard>(*m_seeded, name);
+    QVERIFY(standard);
+    const auto lab = firstLab(*standard);
+    QVERIFY(lab);
+    // Exact: the published values are stored as they are, not rounded or converted.
+    QCOMPARE(lab->L(), L);
+    QCOMPARE(lab->a(), a);
+    QCOMPARE(lab->b(), b);
+    QCOMPARE(lab->colorimetricCondition(), std::string("D50/2"));
 }
 
 void tst_SampleData::displayColoursFollowLab_data()
@@ -284,30 +374,36 @@ void tst_SampleData::displayColoursFollowLab_data()
     // Expected values worked out by hand: the Lab values taken relative to their white
     // and carried to the sRGB white with the Bradford transform, which is what a
     // relative colorimetric rendering does; 8-bit channels clip out-of-gamut colours.
+    // A chart patch converted with the D65 white instead is off by far more than the
+    // tolerance (a greyish white turns blue).
     QTest::addColumn<QString>("name");
+    QTest::addColumn<QString>("condition");
     QTest::addColumn<QColor>("expected");
-    QTest::newRow("light warm beige") << "Ivory Beige" << QColor(220, 204, 172);
-    QTest::newRow("dark neutral grey") << "Graphite Grey" << QColor(76, 79, 84);
-    QTest::newRow("saturated red") << "Signal Red" << QColor(171, 31, 41);
-    QTest::newRow("mid blue") << "Ocean Blue" << QColor(43, 105, 151);
-    QTest::newRow("mid green") << "Leaf Green" << QColor(50, 128, 63);
-    QTest::newRow("yellow at the gamut edge") << "Sun Yellow" << QColor(242, 192, 0);
+    QTest::newRow("light warm beige") << "Ivory Beige" << "D65/10" << QColor(220, 204, 172);
+    QTest::newRow("dark neutral grey") << "Graphite Grey" << "D65/10" << QColor(76, 79, 84);
+    QTest::newRow("saturated red") << "Signal Red" << "D65/10" << QColor(171, 31, 41);
+    QTest::newRow("mid blue") << "Ocean Blue" << "D65/10" << QColor(43, 105, 151);
+    QTest::newRow("mid green") << "Leaf Green" << "D65/10" << QColor(50, 128, 63);
+    QTest::newRow("yellow at the gamut edge") << "Sun Yellow" << "D65/10" << QColor(242, 192, 0);
+    QTest::newRow("chart skin tone") << "Dark Skin" << "D50/2" << QColor(116, 79, 65);
+    QTest::newRow("chart orange") << "Orange" << "D50/2" << QColor(224, 124, 48);
+    QTest::newRow("chart blue") << "Blue" << "D50/2" << QColor(40, 62, 145);
+    QTest::newRow("chart cyan, red channel clipped") << "Cyan" << "D50/2" << QColor(0, 133, 165);
+    QTest::newRow("chart white, slightly yellowish") << "White 9.5" << "D50/2" << QColor(241, 242, 235);
+    QTest::newRow("chart mid grey") << "Neutral 5" << "D50/2" << QColor(121, 121, 121);
 }
 
 void tst_SampleData::displayColoursFollowLab()
 {
     QFETCH(QString, name);
+    QFETCH(QString, condition);
     QFETCH(QColor, expected);
 
-    std::shared_ptr<Standard> standard;
-    for (const auto& candidate : fetchAll<Standard>(*m_seeded)) {
-        if (candidate->name() == name.toStdString())
-            standard = candidate;
-    }
+    const auto standard = fetchNamed<Standard>(*m_seeded, name);
     QVERIFY(standard);
-    auto lab = std::dynamic_pointer_cast<LabValue>(standard->appearanceValues(0)->colorValues().at(0));
+    const auto lab = firstLab(*standard);
     QVERIFY(lab);
-    QCOMPARE(lab->colorimetricCondition(), std::string("D65/10"));
+    QCOMPARE(QString::fromStdString(lab->colorimetricCondition()), condition);
 
     const auto rgb = standard->displayRGB();
     QVERIFY(rgb);
@@ -316,6 +412,122 @@ void tst_SampleData::displayColoursFollowLab()
     QVERIFY2(qAbs(actual.red() - expected.red()) <= tolerance && qAbs(actual.green() - expected.green()) <= tolerance
                  && qAbs(actual.blue() - expected.blue()) <= tolerance,
              qPrintable(QStringLiteral("%1 shows as %2").arg(name, actual.name())));
+}
+
+void tst_SampleData::toleranceSetsCarryFormulaAndCondition_data()
+{
+    QTest::addColumn<QString>("set");
+    QTest::addColumn<QString>("method");
+    QTest::addColumn<double>("limit");
+    QTest::addColumn<QString>("condition");
+    QTest::newRow("interior parts, dE2000") << "Automotive Interior" << "dE2000" << 1.0 << "D65/10";
+    QTest::newRow("fabrics, CMC 2:1") << "Seat Fabric CMC" << "dECMC(2:1)" << 1.2 << "D65/10";
+    QTest::newRow("chart, dE2000 under D50") << "Chart Check" << "dE2000" << 1.5 << "D50/2";
+    QTest::newRow("labels, dE*ab") << "Printed Labels" << "dE*ab" << 3.0 << "D50/2";
+}
+
+void tst_SampleData::toleranceSetsCarryFormulaAndCondition()
+{
+    QFETCH(QString, set);
+    QFETCH(QString, method);
+    QFETCH(double, limit);
+    QFETCH(QString, condition);
+
+    const auto tolerances = fetchNamed<ToleranceSet>(*m_seeded, set);
+    QVERIFY(tolerances);
+    QCOMPARE(int(tolerances->tolerances().size()), 1);
+    // The editor's condition check looks at a Lab tolerance only; any other kind passes unchecked.
+    const auto tolerance = firstLabTolerance(*tolerances);
+    QVERIFY(tolerance);
+    QCOMPARE(QString::fromStdString(tolerance->method()), method);
+    QCOMPARE(tolerance->limit(), limit);
+    QVERIFY(tolerance->colorimetricCondition());
+    QCOMPARE(QString::fromStdString(tolerance->colorimetricCondition()->toString()), condition);
+}
+
+// The pairs a user tries in the editor: a template's standards and a tolerance
+// set to add. The editor compares the two strings byte for byte.
+void tst_SampleData::conditionsOfStandardAndTolerance_data()
+{
+    QTest::addColumn<QString>("jobTemplate");
+    QTest::addColumn<QString>("library");
+    QTest::addColumn<QString>("set");
+    QTest::addColumn<bool>("equal");
+    QTest::newRow("door panel standards accept the interior tolerance")
+        << "Door Panel Trim" << QString() << "Automotive Interior" << true;
+    QTest::newRow("dashboard standards accept the fabric tolerance")
+        << "Dashboard Fascia" << QString() << "Seat Fabric CMC" << true;
+    QTest::newRow("door panel standards refuse the label tolerance")
+        << "Door Panel Trim" << QString() << "Printed Labels" << false;
+    QTest::newRow("dashboard standards refuse the chart tolerance")
+        << "Dashboard Fascia" << QString() << "Chart Check" << false;
+    QTest::newRow("chart standards accept the chart tolerance") << QString() << "Colour Chart 24" << "Chart Check" << true;
+    QTest::newRow("chart greys refuse the interior tolerance")
+        << QString() << "Chart Grey Scale" << "Automotive Interior" << false;
+}
+
+void tst_SampleData::conditionsOfStandardAndTolerance()
+{
+    QFETCH(QString, jobTemplate);
+    QFETCH(QString, library);
+    QFETCH(QString, set);
+    QFETCH(bool, equal);
+
+    std::vector<std::shared_ptr<Standard>> standards;
+    if (!jobTemplate.isEmpty()) {
+        const auto stored = fetchNamed<QCJobTemplate>(*m_seeded, jobTemplate);
+        QVERIFY(stored);
+        standards = stored->standards();
+    } else {
+        const auto stored = fetchNamed<ColorStandardsLibrary>(*m_seeded, library, 2);
+        QVERIFY(stored);
+        standards = stored->standards();
+    }
+    // Without standards every tolerance passes, and the row would prove nothing.
+    QVERIFY(!standards.empty());
+    const auto tolerances = fetchNamed<ToleranceSet>(*m_seeded, set);
+    QVERIFY(tolerances);
+    const auto tolerance = firstLabTolerance(*tolerances);
+    QVERIFY(tolerance && tolerance->colorimetricCondition());
+    const std::string toleranceCondition = tolerance->colorimetricCondition()->toString();
+
+    for (const auto& standard : standards) {
+        const auto lab = firstLab(*standard);
+        QVERIFY2(lab, standard->name().c_str());
+        QVERIFY2((lab->colorimetricCondition() == toleranceCondition) == equal,
+                 qPrintable(QStringLiteral("%1 uses %2, the tolerance %3")
+                                .arg(QString::fromStdString(standard->name()),
+                                     QString::fromStdString(lab->colorimetricCondition()),
+                                     QString::fromStdString(toleranceCondition))));
+    }
+}
+
+void tst_SampleData::definitionsWithAndWithoutDefaults_data()
+{
+    QTest::addColumn<QString>("definition");
+    QTest::addColumn<QString>("defaultValue");
+    QTest::addColumn<bool>("choice");
+    QTest::newRow("free text without default") << "Supplier" << QString() << false;
+    QTest::newRow("another free text without default") << "Inspector" << QString() << false;
+    QTest::newRow("free text with default") << "Parts per Lot" << "3" << false;
+    QTest::newRow("choice defaulting to its first value") << "Material" << "PP-T20" << true;
+    QTest::newRow("shift choice") << "Shift" << "Early" << true;
+    QTest::newRow("light booth choice") << "Light Booth" << "D65" << true;
+}
+
+void tst_SampleData::definitionsWithAndWithoutDefaults()
+{
+    QFETCH(QString, definition);
+    QFETCH(QString, defaultValue);
+    QFETCH(bool, choice);
+
+    const auto stored = fetchNamed<TagDefinition>(*m_seeded, definition);
+    QVERIFY(stored);
+    QCOMPARE(QString::fromStdString(stored->defaultValue()), defaultValue);
+    const auto allowed = stored->allowedValues();
+    QCOMPARE(!allowed.empty(), choice);
+    if (choice)
+        QVERIFY(std::find(allowed.begin(), allowed.end(), defaultValue.toStdString()) != allowed.end());
 }
 
 void tst_SampleData::secondRunAddsNothing()
