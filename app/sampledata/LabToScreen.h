@@ -2,6 +2,7 @@
 
 #include <QColor>
 
+#include <array>
 #include <memory>
 
 namespace vemi {
@@ -9,9 +10,9 @@ namespace vemi {
 class ColorimetricCondition;
 
 // Lab to 8-bit sRGB through Little CMS, for Lab values whose white is that of
-// one illuminant. Relative colorimetric intent maps the Lab white onto the
-// screen white; the 8-bit output clips colours outside the sRGB gamut channel
-// by channel.
+// one illuminant. The colour is adapted from that white to the screen white
+// with the Bradford transform, so the Lab white shows as the screen white; the
+// 8-bit output clips colours outside the sRGB gamut channel by channel.
 class LabToScreen
 {
 public:
@@ -28,9 +29,11 @@ public:
     QColor convert(double L, double a, double b) const;
 
 private:
-    explicit LabToScreen(void* transform) : m_transform(transform) {}
+    using Xyz = std::array<double, 3>;
+    LabToScreen(void* transform, const Xyz& white) : m_transform(transform), m_white(white) {}
 
-    void* m_transform; // a cmsHTRANSFORM, never null
+    void* m_transform; // a cmsHTRANSFORM from D50 XYZ, never null
+    Xyz m_white;       // XYZ of the Lab values' white, Y = 1
 };
 
 } // namespace vemi
