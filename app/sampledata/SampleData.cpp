@@ -62,7 +62,6 @@ std::shared_ptr<FillEmptyStore> SampleData::buildSet(QString* error)
     }
     const SampleCatalogue::Samples samples = SampleCatalogue::samples(*d65ToScreen, *d50ToScreen);
 
-    // Libraries refer to their members, so the members are written first.
     auto set = std::make_shared<FillEmptyStore>("store the sample data");
     addAll(*set, Standard::typeId(), kSamplesFolder, samples.standards);
     addAll(*set, Standard::typeId(), kChartFolder, samples.chartStandards);
