@@ -220,6 +220,8 @@ void ObjectBrowserDialog::scheduleLoad()
 
 void ObjectBrowserDialog::loadTree()
 {
+    // The combo box cuts a long store id; its tool tip shows it whole.
+    m_dispatcherCombo->setToolTip(m_dispatcherCombo->currentText());
     auto* model = new DirEntryTreeModel(m_store, this);
     model->setDispatcherId(currentDispatcherId());
     model->setObjectType(currentTypeId());
@@ -245,7 +247,12 @@ void ObjectBrowserDialog::loadTree()
     model->load([this, model](bool ok) {
         if (!ok)
             return;
-        m_statusLabel->clear();
+        // An empty tree alone would look like a store still being read.
+        if (model->rowCount() == 0)
+            m_statusLabel->setText(tr("The store \"%1\" holds no %2.")
+                                       .arg(m_dispatcherCombo->currentText(), ObjectTypeNames::plural(model->objectType()).toLower()));
+        else
+            m_statusLabel->clear();
         openRemembered(model);
     });
 }
