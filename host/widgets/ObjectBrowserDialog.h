@@ -45,8 +45,9 @@ public:
     // empty list offers the default store alone. Ids that name no store are
     // listed but cannot be chosen.
     void setDispatcherList(const std::vector<std::string>& dispatcherIds);
-    // Where the dialog opens; a store or folder that no longer exists opens
-    // the top level of the first store that can be chosen. May be null.
+    // Where the dialog opens. A folder that no longer exists opens the top
+    // level of its store; a store that is not listed or cannot be chosen, the
+    // first store that can. May be null.
     void setLastSelectedPath(std::shared_ptr<SelectedPath> path);
     // The store and folder current when OK was pressed; before that, the path set.
     std::shared_ptr<SelectedPath> lastSelectedPath() const { return m_lastSelectedPath; }
