@@ -252,6 +252,44 @@ icon Types/MeasurementConfiguration.png 16 16 "
       line -5,-3 -5,0.5 line -2.5,-3 -2.5,-1 line 0,-3 0,0.5 line 2.5,-3 2.5,-1 line 5,-3 5,0.5
     pop graphic-context"
 
+# a single tolerance: a blue bracket with plus/minus, lighter than the set's tile
+icon Types/Tolerance.png 16 16 "
+    stroke $BLUE stroke-width 1.2 fill $PALE roundrectangle 1.5,1.5 14.5,14.5 2.5,2.5
+    stroke $BLUE stroke-width 1.6 fill none stroke-linecap butt
+    line 8,3.5 8,9 line 5.2,6.2 10.8,6.2 line 5.2,11.8 10.8,11.8"
+
+icon Types/CheckPoint.png 16 16 "
+    stroke $INK stroke-width 1 fill white rectangle 1.5,1.5 14.5,14.5
+    stroke $BLUE stroke-width 1.4 fill none circle 8,8 8,12.5
+    stroke none fill $BLUE circle 8,8 8,9.6"
+
+icon Types/CheckPointCouple.png 16 16 "
+    stroke $INK stroke-width 1 fill white rectangle 0.5,3.5 8.5,11.5 rectangle 7.5,4.5 15.5,12.5
+    stroke none fill $BLUE circle 4.5,7.5 4.5,9.3
+    fill $AMBER circle 11.5,8.5 11.5,10.3"
+
+icon Types/SchematicImage.png 16 16 "
+    stroke $INK stroke-width 1 fill white rectangle 1.5,2.5 14.5,13.5
+    stroke none fill $AMBER circle 10.5,5.5 10.5,7
+    fill $MID polygon 2,13 6,7.5 8.5,10.5 10.5,8.5 14,13"
+
+icon Types/ColorValue.png 16 16 "
+    stroke $INK stroke-width 1 fill $LIGHT roundrectangle 1.5,1.5 14.5,14.5 1.5,1.5
+    stroke none fill $RED circle 6,6.5 6,9.5
+    fill $GREEN circle 10,6.5 10,9.5
+    fill $BLUE circle 8,10 8,13"
+
+# a lamp above an eye: the illuminant and observer of a colour
+icon Types/ColorimetricCondition.png 16 16 "
+    stroke $INK stroke-width 1 fill $AMBER circle 8,4.5 8,7.5
+    fill white path 'M 1.5,11.5 Q 8,6 14.5,11.5 Q 8,17 1.5,11.5 Z'
+    stroke none fill $BLUE circle 8,11.5 8,13.3"
+
+# any object without a drawing of its own
+icon Types/Object.png 16 16 "
+    stroke $INK stroke-width 1 fill $LIGHT polygon 8,1.5 14.5,5 14.5,11.5 8,15 1.5,11.5 1.5,5
+    fill none polyline 1.5,5 8,8.5 14.5,5 line 8,8.5 8,15"
+
 # ---------------------------------------------------------------- plug-in tab image
 # White bold "QC" on a transparent 47x52 canvas; the host paints it on a dark
 # tab, so no outline or shadow. Written with Huffman-only deflate (strategy 2),

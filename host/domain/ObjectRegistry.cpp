@@ -47,6 +47,14 @@ bool ObjectRegistry::knows(const std::string& typeId)
     return creators().count(typeId) != 0;
 }
 
+std::vector<std::string> ObjectRegistry::typeIds()
+{
+    std::vector<std::string> ids;
+    for (const auto& entry : creators())
+        ids.push_back(entry.first);
+    return ids;
+}
+
 const ObjectRegistry::Creators& ObjectRegistry::creators()
 {
     static const Creators all = [] {

@@ -20,6 +20,9 @@ void TagDefinition::writeFields(QCborMap& map) const
     NamedObject::writeFields(map);
     map.insert(QStringLiteral("defaultValue"), ObjectCodec::text(m_defaultValue));
     map.insert(QStringLiteral("allowedValues"), ObjectCodec::textList(m_allowedValues));
+    // Written only for numbers, so that text definitions stay as they were stored before.
+    if (m_valueKind == ValueKind::Number)
+        map.insert(QStringLiteral("valueKind"), QStringLiteral("number"));
 }
 
 void TagDefinition::readFields(const QCborMap& map)
@@ -27,6 +30,13 @@ void TagDefinition::readFields(const QCborMap& map)
     NamedObject::readFields(map);
     m_defaultValue = ObjectCodec::readText(map, QStringLiteral("defaultValue"));
     m_allowedValues = ObjectCodec::readTextList(map, QStringLiteral("allowedValues"));
+    const std::string kind = ObjectCodec::readText(map, QStringLiteral("valueKind"));
+    if (kind.empty() || kind == "text")
+        m_valueKind = ValueKind::Text;
+    else if (kind == "number")
+        m_valueKind = ValueKind::Number;
+    else
+        throw DecodeError("unknown tag value kind " + kind);
 }
 
 } // namespace vemi

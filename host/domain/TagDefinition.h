@@ -9,6 +9,9 @@ namespace vemi {
 class TagDefinition : public NamedObject
 {
 public:
+    // What a value may hold; a definition with allowed values takes only those.
+    enum class ValueKind { Text, Number };
+
     static const std::string& typeId();
     std::string objectTypeId() const override;
 
@@ -17,6 +20,8 @@ public:
     // Empty for a free-text property.
     std::vector<std::string> allowedValues() const { return m_allowedValues; }
     void setAllowedValues(const std::vector<std::string>& values) { m_allowedValues = values; }
+    ValueKind valueKind() const { return m_valueKind; }
+    void setValueKind(ValueKind kind) { m_valueKind = kind; }
 
     void writeFields(QCborMap& map) const override;
     void readFields(const QCborMap& map) override;
@@ -24,6 +29,7 @@ public:
 private:
     std::string m_defaultValue;
     std::vector<std::string> m_allowedValues;
+    ValueKind m_valueKind = ValueKind::Text;
 };
 
 } // namespace vemi

@@ -17,6 +17,7 @@ void registerHostMetaTypes()
     qRegisterMetaType<std::shared_ptr<vemi::ErrorInfo>>("std::shared_ptr<vemi::ErrorInfo>");
     qRegisterMetaType<std::shared_ptr<vemi::Progress>>("std::shared_ptr<vemi::Progress>");
     qRegisterMetaType<std::shared_ptr<vemi::BaseObject>>("std::shared_ptr<vemi::BaseObject>");
+    qRegisterMetaType<std::string>("std::string");
 }
 
 } // namespace

@@ -3,6 +3,7 @@
 #include <QMetaType>
 
 #include <memory>
+#include <string>
 
 namespace vemi {
 class BaseObject;
@@ -15,3 +16,5 @@ Q_DECLARE_METATYPE(std::shared_ptr<vemi::Response>)
 Q_DECLARE_METATYPE(std::shared_ptr<vemi::ErrorInfo>)
 Q_DECLARE_METATYPE(std::shared_ptr<vemi::Progress>)
 Q_DECLARE_METATYPE(std::shared_ptr<vemi::BaseObject>)
+// Carried by the tag display's double-click signal.
+Q_DECLARE_METATYPE(std::string)

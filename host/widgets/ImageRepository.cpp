@@ -3,6 +3,8 @@
 #include <QFile>
 #include <QPixmap>
 
+#include <map>
+
 namespace vemi {
 
 namespace {
@@ -16,6 +18,34 @@ QIcon brightened(const QIcon& icon)
         result.addPixmap(QPixmap::fromImage(image));
     }
     return result;
+}
+
+// Types drawn alike: a subclass or a part looks like the object it belongs to.
+const std::map<QString, QString>& sharedDrawings()
+{
+    static const std::map<QString, QString> drawings = {
+        {QStringLiteral("LabToleranceBase"), QStringLiteral("Tolerance")},
+        {QStringLiteral("TagValue"), QStringLiteral("TagDefinition")},
+        {QStringLiteral("Property"), QStringLiteral("TagDefinition")},
+        {QStringLiteral("LabValue"), QStringLiteral("ColorValue")},
+        {QStringLiteral("RGBValue"), QStringLiteral("ColorValue")},
+        {QStringLiteral("AppearanceValues"), QStringLiteral("ColorValue")},
+    };
+    return drawings;
+}
+
+// The file name (without ".png") of the drawing for typeId; "Object" for a
+// type without one, so that every row of a list or tree shows an icon.
+QString drawingForType(const std::string& typeId)
+{
+    // Type ids read "vemi.ClassName"; the drawing is named after the class.
+    QString className = QString::fromStdString(typeId).section(QLatin1Char('.'), -1);
+    const auto shared = sharedDrawings().find(className);
+    if (shared != sharedDrawings().end())
+        className = shared->second;
+    if (className.isEmpty() || !QFile::exists(QStringLiteral(":/Images/Types/%1.png").arg(className)))
+        return QStringLiteral("Object");
+    return className;
 }
 
 } // namespace
@@ -47,12 +77,7 @@ QIcon ImageRepository::appIcon(const std::string& appName) const
 
 QIcon ImageRepository::iconForType(const std::string& typeId, int brightness) const
 {
-    // Type ids read "vemi.ClassName"; the icon file is named after the class.
-    const QString className = QString::fromStdString(typeId).section(QLatin1Char('.'), -1);
-    const QString path = QStringLiteral(":/Images/Types/%1.png").arg(className);
-    if (!QFile::exists(path))
-        return QIcon();
-    const QIcon icon(path);
+    const QIcon icon(QStringLiteral(":/Images/Types/%1.png").arg(drawingForType(typeId)));
     return brightness > 0 ? brightened(icon) : icon;
 }
 

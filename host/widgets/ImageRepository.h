@@ -12,6 +12,9 @@ namespace vemi {
 class ImageRepository
 {
 public:
+    // How an icon is drawn: for light backgrounds, or lightened for dark ones.
+    enum EBrightness { Light = 0, Dark = 1 };
+
     static ImageRepository& instance();
 
     // The four icons are the application icon for the normal, active,
@@ -20,7 +23,8 @@ public:
                          const QIcon& selected, const QIcon& disabled);
     // A null icon for an application that registered none.
     QIcon appIcon(const std::string& appName) const;
-    // brightness: 0 for icons on light backgrounds, 1 for dark ones.
+    // Never null: a type without an icon of its own gets the generic object icon.
+    // brightness: an EBrightness; 0 for icons on light backgrounds, 1 for dark ones.
     QIcon iconForType(const std::string& typeId, int brightness = 0) const;
     QIcon folderIcon() const;
 

@@ -287,6 +287,12 @@ void tst_Domain::everyClassSurvivesRoundTrip_data()
     add(makeAppearance());
     add(makeStandard(kUtf8Text));
     add(makeTagDefinition());
+    auto numberDefinition = makeTagDefinition();
+    numberDefinition->setAllowedValues({});
+    numberDefinition->setValueKind(TagDefinition::ValueKind::Number);
+    QTest::newRow("vemi.TagDefinition for numbers") << ObjectCodec::serialize(*numberDefinition)
+                                                    << QString::fromStdString(TagDefinition::typeId())
+                                                    << QString::fromStdString(numberDefinition->id());
     add(TagValue::forDefinition(*makeTagDefinition(), kUtf8Text));
     add(makeTolerance());
     add(makeLabTolerance());
@@ -530,6 +536,8 @@ void tst_Domain::malformedBytesThrow_data()
     untyped.remove(QStringLiteral("type"));
     QTest::newRow("missing type id") << untyped.toCborValue().toCbor();
 
+    QTest::newRow("tag definition of an unknown value kind")
+        << withField(*makeTagDefinition(), "valueKind", QStringLiteral("colour"));
     QTest::newRow("check list holding a standard")
         << withField(*jobTemplate, "checkListItems", QCborArray{ObjectCodec::encode(*makeStandard("S"))});
     QTest::newRow("check list holding a number")

@@ -1,0 +1,224 @@
+#include "tests/common/TestMain.h"
+
+#include "host/domain/TagDefinition.h"
+#include "host/domain/TagValue.h"
+#include "host/widgets/TagDisplayWidget.h"
+
+#include <QTableWidget>
+
+#include <memory>
+
+using vemi::TagDefinition;
+using vemi::TagDisplayWidget;
+using vemi::TagValue;
+
+namespace {
+
+using Definitions = std::vector<std::shared_ptr<TagDefinition>>;
+using Values = std::vector<std::shared_ptr<TagValue>>;
+
+std::shared_ptr<TagDefinition> definition(const std::string& name, const std::string& defaultValue = {})
+{
+    auto result = std::make_shared<TagDefinition>();
+    result->setName(name);
+    result->setDefaultValue(defaultValue);
+    return result;
+}
+
+// Four definitions: "Supplier" (no default), "Batch" (default "B-1"),
+// "Material", "Größe" (default "M").
+Definitions fourDefinitions()
+{
+    return {definition("Supplier"), definition("Batch", "B-1"), definition("Material"), definition("Größe", "M")};
+}
+
+} // namespace
+
+class tst_TagDisplayWidget : public QObject
+{
+    Q_OBJECT
+
+private slots:
+    void init();
+    void cleanup();
+    void showsOneRowPerDefinition_data();
+    void showsOneRowPerDefinition();
+    void clickSelectsRowAndReportsIt();
+    void ctrlClickAddsRowsInRowOrder();
+    void clickBelowTheRowsReportsNoRow();
+    void doubleClickReportsRowAndName();
+    void clearSelectionsLeavesNoRowSelected();
+    void setTagsReplacesEveryRow();
+
+private:
+    QTableWidget* table() const { return m_widget->findChild<QTableWidget*>(QStringLiteral("tagTable")); }
+    QPoint rowCentre(int row) const;
+    void clickRow(int row, Qt::KeyboardModifiers modifiers = Qt::NoModifier);
+    void doubleClickRow(int row);
+
+    std::unique_ptr<TagDisplayWidget> m_widget;
+    Definitions m_definitions;
+};
+
+void tst_TagDisplayWidget::init()
+{
+    m_widget = std::make_unique<TagDisplayWidget>();
+    m_widget->resize(400, 300);
+    m_definitions = fourDefinitions();
+    m_widget->setTags({}, m_definitions);
+    m_widget->show();
+    QVERIFY(QTest::qWaitForWindowExposed(m_widget.get()));
+    QVERIFY(table());
+}
+
+void tst_TagDisplayWidget::cleanup()
+{
+    m_widget.reset();
+}
+
+QPoint tst_TagDisplayWidget::rowCentre(int row) const
+{
+    return table()->visualItemRect(table()->item(row, 0)).center();
+}
+
+void tst_TagDisplayWidget::clickRow(int row, Qt::KeyboardModifiers modifiers)
+{
+    QTest::mouseClick(table()->viewport(), Qt::LeftButton, modifiers, rowCentre(row));
+}
+
+// QTest's double-click event comes without the press that a real one follows.
+void tst_TagDisplayWidget::doubleClickRow(int row)
+{
+    clickRow(row);
+    QTest::mouseDClick(table()->viewport(), Qt::LeftButton, Qt::NoModifier, rowCentre(row));
+}
+
+void tst_TagDisplayWidget::showsOneRowPerDefinition_data()
+{
+    QTest::addColumn<QList<int>>("valueOf");   // definition index per value, in the values' order
+    QTest::addColumn<QStringList>("texts");
+    QTest::addColumn<QStringList>("expected"); // value column, row by row
+
+    QTest::newRow("no values: defaults or blank") << QList<int>{} << QStringList{}
+                                                  << QStringList{"", "B-1", "", "M"};
+    QTest::newRow("a value wins over the default") << QList<int>{1} << QStringList{"B-7"}
+                                                   << QStringList{"", "B-7", "", "M"};
+    QTest::newRow("values in another order than the definitions")
+        << QList<int>{3, 0} << QStringList{"XL", "Acme"} << QStringList{"Acme", "B-1", "", "XL"};
+    QTest::newRow("fewer values than definitions, not at the same positions")
+        << QList<int>{2} << QStringList{"Steel"} << QStringList{"", "B-1", "Steel", "M"};
+    QTest::newRow("a blank value hides the default") << QList<int>{3} << QStringList{""}
+                                                     << QStringList{"", "B-1", "", ""};
+    QTest::newRow("a value of an unknown definition shows nowhere")
+        << QList<int>{-1, 0} << QStringList{"lost", "Acme"} << QStringList{"Acme", "B-1", "", "M"};
+}
+
+void tst_TagDisplayWidget::showsOneRowPerDefinition()
+{
+    QFETCH(QList<int>, valueOf);
+    QFETCH(QStringList, texts);
+    QFETCH(QStringList, expected);
+
+    TagDefinition stranger;
+    Values values;
+    for (int i = 0; i < valueOf.size(); ++i) {
+        const TagDefinition& owner = valueOf[i] < 0 ? stranger : *m_definitions[size_t(valueOf[i])];
+        values.push_back(TagValue::forDefinition(owner, texts[i].toStdString()));
+    }
+    m_widget->setTags(values, m_definitions);
+
+    QCOMPARE(table()->rowCount(), int(m_definitions.size()));
+    QStringList shown;
+    for (int row = 0; row < table()->rowCount(); ++row) {
+        QCOMPARE(table()->item(row, 0)->text(), QString::fromStdString(m_definitions[size_t(row)]->name()));
+        shown << table()->item(row, 1)->text();
+    }
+    QCOMPARE(shown, expected);
+}
+
+void tst_TagDisplayWidget::clickSelectsRowAndReportsIt()
+{
+    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+
+    clickRow(2);
+
+    QCOMPARE(m_widget->getSelectedRows(), std::vector<int>{2});
+    QVERIFY(!selected.isEmpty());
+    QCOMPARE(selected.last().at(0).toInt(), 2);
+    QCOMPARE(selected.last().at(1).toStringList(), QStringList{"Material"});
+}
+
+void tst_TagDisplayWidget::ctrlClickAddsRowsInRowOrder()
+{
+    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+
+    clickRow(3);
+    clickRow(0, Qt::ControlModifier);
+
+    QCOMPARE(m_widget->getSelectedRows(), (std::vector<int>{0, 3}));
+    QCOMPARE(selected.last().at(0).toInt(), 0);
+    QCOMPARE(selected.last().at(1).toStringList(), (QStringList{"Supplier", "Größe"}));
+
+    // Ctrl-clicking a selected row takes it out again.
+    clickRow(3, Qt::ControlModifier);
+    QCOMPARE(m_widget->getSelectedRows(), std::vector<int>{0});
+}
+
+void tst_TagDisplayWidget::clickBelowTheRowsReportsNoRow()
+{
+    clickRow(1);
+    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+    const QPoint belowLastRow(10, table()->visualItemRect(table()->item(3, 0)).bottom() + 20);
+    QVERIFY(!table()->indexAt(belowLastRow).isValid());
+
+    QTest::mouseClick(table()->viewport(), Qt::LeftButton, Qt::NoModifier, belowLastRow);
+
+    QVERIFY(m_widget->getSelectedRows().empty());
+    QCOMPARE(selected.count(), 1);
+    QVERIFY(selected.last().at(0).toInt() < 0);
+    QVERIFY(selected.last().at(1).toStringList().isEmpty());
+}
+
+void tst_TagDisplayWidget::doubleClickReportsRowAndName()
+{
+    QSignalSpy doubleClicked(m_widget.get(), &TagDisplayWidget::tagRowDoubleClicked);
+
+    doubleClickRow(3);
+
+    QCOMPARE(doubleClicked.count(), 1);
+    QCOMPARE(doubleClicked.first().at(0).toInt(), 3);
+    QCOMPARE(doubleClicked.first().at(1).value<std::string>(), std::string("Größe"));
+}
+
+void tst_TagDisplayWidget::clearSelectionsLeavesNoRowSelected()
+{
+    clickRow(1);
+    clickRow(2, Qt::ShiftModifier);
+    QCOMPARE(m_widget->getSelectedRows(), (std::vector<int>{1, 2}));
+    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+
+    m_widget->clearSelections();
+
+    QVERIFY(m_widget->getSelectedRows().empty());
+    QCOMPARE(selected.count(), 1);
+    QVERIFY(selected.last().at(0).toInt() < 0);
+}
+
+void tst_TagDisplayWidget::setTagsReplacesEveryRow()
+{
+    clickRow(3);
+    m_widget->setTags({}, {definition("Only")});
+
+    QCOMPARE(table()->rowCount(), 1);
+    QCOMPARE(table()->item(0, 0)->text(), QStringLiteral("Only"));
+    QVERIFY(m_widget->getSelectedRows().empty());
+
+    // A double-click on the new row names the new definition, not the old row's.
+    QSignalSpy doubleClicked(m_widget.get(), &TagDisplayWidget::tagRowDoubleClicked);
+    doubleClickRow(0);
+    QCOMPARE(doubleClicked.count(), 1);
+    QCOMPARE(doubleClicked.first().at(1).value<std::string>(), std::string("Only"));
+}
+
+QC_TEST_MAIN(tst_TagDisplayWidget)
+#include "tst_tagdisplaywidget.moc"
