@@ -63,6 +63,10 @@ PellamWidget::PellamWidget(std::shared_ptr<PellamSettings>, std::shared_ptr<Gene
 PellamWidget::~PellamWidget()
 {
     QSettings().setValue(PellamKeys::MainSplitterState, m_splitter->saveState());
+    // The browser (inside the splitter) goes before the tree model it shows,
+    // which is a child of this widget and would otherwise die first.
+    delete m_splitter;
+    m_splitter = nullptr;
     m_model.reset();
 }
 

@@ -160,8 +160,7 @@ void StoreDatabase::openReadOnly()
     const QFileInfo folder(info.absolutePath());
     const bool anyoneMayWrite =
         folder.permissions() & (QFileDevice::WriteOwner | QFileDevice::WriteGroup | QFileDevice::WriteOther);
-    const bool writable = folder.isWritable() && anyoneMayWrite;
-    if (!writable && !QFileInfo::exists(m_path + QStringLiteral("-wal"))) {
+    if (!anyoneMayWrite && !QFileInfo::exists(m_path + QStringLiteral("-wal"))) {
         connect(Access::Immutable);
         return;
     }

@@ -286,7 +286,7 @@ void DirEntryBrowserWidget::updateActions()
     const bool editable = ready && m_writable;
     m_actionNew->setEnabled(editable && m_callbacks);
     m_actionOpen->setEnabled(ready);
-    m_actionSave->setEnabled(node && !node->isFolder() && node->isModified() && node->object());
+    m_actionSave->setEnabled(m_writable && node && !node->isFolder() && node->isModified() && node->object());
     m_actionNewFolder->setEnabled(editable);
     m_actionRename->setEnabled(editable && node != nullptr);
     m_actionMove->setEnabled(editable && !nodes.isEmpty());
@@ -394,9 +394,10 @@ bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)
                 progress->loop.quit();
         });
     }
-    // A local event loop keeps the window responsive while the store writes.
+    // A local event loop keeps the window painting while the store writes;
+    // user input waits, so that nothing is edited, deleted or closed meanwhile.
     if (progress->pending > 0)
-        progress->loop.exec();
+        progress->loop.exec(QEventLoop::ExcludeUserInputEvents);
     updateActions();
     return progress->pending == 0 && progress->allSaved;
 }
@@ -421,12 +422,18 @@ bool DirEntryBrowserWidget::mayClose()
     QStringList names;
     for (const Node* node : unsaved)
         names << node->displayName();
-    QMessageBox box(QMessageBox::Question, tr("Unsaved changes"), unsavedChangesQuestion(m_model->objectType(), names),
-                    QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel, this);
-    box.button(QMessageBox::Save)->setText(tr("&Save"));
+    // A read-only store cannot take the changes: the user may only lose them or stay.
+    const QString question = m_writable ? unsavedChangesQuestion(m_model->objectType(), names)
+                                        : unsavableChangesQuestion(m_model->objectType(), names);
+    QMessageBox box(QMessageBox::Question, tr("Unsaved changes"), question,
+                    m_writable ? QMessageBox::Save | QMessageBox::Discard | QMessageBox::Cancel
+                               : QMessageBox::Discard | QMessageBox::Cancel,
+                    this);
+    if (m_writable)
+        box.button(QMessageBox::Save)->setText(tr("&Save"));
     box.button(QMessageBox::Discard)->setText(tr("&Discard"));
     box.button(QMessageBox::Cancel)->setText(tr("&Cancel"));
-    box.setDefaultButton(QMessageBox::Save);
+    box.setDefaultButton(m_writable ? QMessageBox::Save : QMessageBox::Cancel);
     const int answer = box.exec();
     if (answer == QMessageBox::Discard)
         return true;
@@ -442,10 +449,26 @@ QString DirEntryBrowserWidget::unsavedChangesQuestion(const std::string& typeId,
         : tr("These %1 %2 have unsaved changes. Save them before closing?")
               .arg(names.size())
               .arg(ObjectTypeNames::plural(typeId));
+    return question + nameList(names);
+}
+
+QString DirEntryBrowserWidget::unsavableChangesQuestion(const std::string& typeId, const QStringList& names)
+{
+    const QString question = names.size() == 1
+        ? tr("This %1 has changes that cannot be saved, because the store is read-only. Close and lose them?")
+              .arg(ObjectTypeNames::singular(typeId))
+        : tr("These %1 %2 have changes that cannot be saved, because the store is read-only. Close and lose them?")
+              .arg(names.size())
+              .arg(ObjectTypeNames::plural(typeId));
+    return question + nameList(names);
+}
+
+QString DirEntryBrowserWidget::nameList(const QStringList& names)
+{
     QStringList lines;
     for (const QString& name : names)
         lines << QStringLiteral("  • ") + name;
-    return question + QStringLiteral("\n\n") + lines.join(QLatin1Char('\n'));
+    return QStringLiteral("\n\n") + lines.join(QLatin1Char('\n'));
 }
 
 void DirEntryBrowserWidget::refresh()

@@ -72,6 +72,8 @@ public:
     // The question mayClose() asks about the objects named (one or several)
     // of the type typeId.
     static QString unsavedChangesQuestion(const std::string& typeId, const QStringList& names);
+    // The same when the store is read-only and the changes can only be lost.
+    static QString unsavableChangesQuestion(const std::string& typeId, const QStringList& names);
 
     DirEntryTreeModel* treeModel() const { return m_model; }
     QTreeView* treeView() const { return m_tree; }
@@ -92,6 +94,7 @@ signals:
     void sgSelectionChanged(QVector<vemi::BaseObjectTreeModel::Node*> selectedNodes);
 
 private:
+    static QString nameList(const QStringList& names);
     void createActions();
     void keepNamesReadable();
     void keepViewState();

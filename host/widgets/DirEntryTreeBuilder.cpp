@@ -120,6 +120,9 @@ void DirEntryTreeBuilder::keepUnsavedWork(Node* root)
     }
     for (auto& [id, node] : m_unsaved) {
         Node* folder = folderOr(node->folderId(), root);
+        // Its folder was deleted too: it is shown, and so saved, at the top level.
+        if (folder == root)
+            node->setFolderId(std::string());
         BaseObjectTreeModel::adopt(folder, std::move(node));
     }
     m_unsaved.clear();

@@ -169,6 +169,7 @@ private slots:
     void folderCommandsAskThenAct();
     void refusedRenameKeepsTheStoredName();
     void refreshWhileSavingKeepsOneNode();
+    void editedObjectSurvivesDeletionElsewhere_data();
     void editedObjectSurvivesDeletionElsewhere();
     void renameThenSaveKeepsTheNewName();
     void renamedNewTemplateSurvivesRefreshAndSave();
@@ -181,6 +182,7 @@ private slots:
     void renameDialogKeepsOkDisabledForRefusedNames();
     void readOnlyStoreDisablesEditing_data();
     void readOnlyStoreDisablesEditing();
+    void readOnlyStoreOffersNoSaveAtClose();
     void openPickerTellsPlacesApart_data();
     void openPickerTellsPlacesApart();
     void pickerWithLongNameFitsTheScreen();
@@ -314,21 +316,24 @@ void tst_DirEntryBrowser::modifiedObjectEnablesSave()
 
 void tst_DirEntryBrowser::failedSaveKeepsObjectModified()
 {
-    TempStore store;
+    StoreOptions impatient;
+    impatient.busyTimeoutMs = 100;
+    TempStore store(impatient);
     storeTemplate(store, "Door Panel", "");
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
     Browser browser(store);
     QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Door Panel"))->object());
+    // Another program holds the write lock for as long as the save tries.
+    RawConnection other(store.path());
+    QVERIFY(other.exec(QStringLiteral("BEGIN EXCLUSIVE")));
 
     browser.widget.actionSave()->trigger();
     QTRY_VERIFY(browser.widget.findChild<QMessageBox*>());
     const QString message = browser.widget.findChild<QMessageBox*>()->text();
-    QVERIFY2(message.contains(QStringLiteral("read-only")), qPrintable(message));
+    QVERIFY2(message.contains(QStringLiteral("locked")), qPrintable(message));
     QVERIFY(browser.find(QStringLiteral("Door Panel"))->isModified());
     QVERIFY(browser.widget.actionSave()->isEnabled());
+    QVERIFY(other.exec(QStringLiteral("ROLLBACK")));
 }
 
 void tst_DirEntryBrowser::selectionCarriesLoadedObjects()
@@ -584,23 +589,35 @@ void tst_DirEntryBrowser::refreshWhileSavingKeepsOneNode()
     QVERIFY(static_cast<DirEntryTreeModel::DirEntryNode*>(entries.front())->isSaved());
 }
 
+void tst_DirEntryBrowser::editedObjectSurvivesDeletionElsewhere_data()
+{
+    QTest::addColumn<bool>("inFolder");
+    QTest::newRow("entry at the top level deleted") << false;
+    QTest::newRow("entry's folder deleted with it") << true;
+}
+
 void tst_DirEntryBrowser::editedObjectSurvivesDeletionElsewhere()
 {
+    QFETCH(bool, inFolder);
     TempStore store;
-    storeTemplate(store, "Door Panel", "");
+    const std::string folder = inFolder ? createFolder(store, "Interior") : std::string();
+    storeTemplate(store, "Door Panel", folder);
     Browser browser(store);
     QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     auto* node = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find(QStringLiteral("Door Panel")));
     const auto object = node->object();
     browser.widget.namedObjectWasModified(object);
-    QVERIFY(!store.run(std::make_shared<DeleteDirItems>(std::vector<std::string>{},
-                                                        std::vector<std::string>{node->dirEntry()->id()})).error);
+    const std::vector<std::string> folders = inFolder ? std::vector<std::string>{folder} : std::vector<std::string>{};
+    const std::vector<std::string> entries =
+        inFolder ? std::vector<std::string>{} : std::vector<std::string>{node->dirEntry()->id()};
+    QVERIFY(!store.run(std::make_shared<DeleteDirItems>(folders, entries)).error);
 
     browser.widget.refresh();
     QTRY_VERIFY(!static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find(QStringLiteral("Door Panel")))->isSaved());
     node = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find(QStringLiteral("Door Panel")));
     QCOMPARE(node->object(), object);
     QVERIFY(node->isModified());
+    QCOMPARE(node->parent(), browser.model.root());
 
     browser.select(node);
     browser.widget.actionSave()->trigger();
@@ -980,6 +997,39 @@ QStringList selectedNames(const Browser& browser)
 }
 
 } // namespace
+
+// Edits on a read-only store cannot be stored: Save stays disabled, and the
+// close question offers only to lose them or to stay.
+void tst_DirEntryBrowser::readOnlyStoreOffersNoSaveAtClose()
+{
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    StoreOptions readOnly;
+    readOnly.readOnly = true;
+    store.reopen(readOnly);
+    Browser browser(store);
+    QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
+    browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Door Panel"))->object());
+    QVERIFY(browser.find(QStringLiteral("Door Panel"))->isModified());
+    QVERIFY(!browser.widget.actionSave()->isEnabled());
+
+    QStringList buttons;
+    QString question;
+    ModalAnswer::actOnNextModal([&](QWidget* dialog) {
+        auto* box = qobject_cast<QMessageBox*>(dialog);
+        QVERIFY(box);
+        question = box->text();
+        for (QAbstractButton* button : box->buttons())
+            buttons << button->text();
+        QCOMPARE(box->defaultButton(), box->button(QMessageBox::Cancel));
+        box->button(QMessageBox::Cancel)->click();
+    });
+    QVERIFY(!browser.widget.mayClose());
+    buttons.sort();
+    QCOMPARE(buttons, (QStringList{"&Cancel", "&Discard"}));
+    QVERIFY2(question.contains(QStringLiteral("read-only")) && question.contains(QStringLiteral("Door Panel")),
+             qPrintable(question));
+}
 
 void tst_DirEntryBrowser::openPickerTellsPlacesApart_data()
 {
