@@ -34,8 +34,7 @@ std::shared_ptr<BaseObject> StoredObjectReader::readIntact(const std::string& id
     try {
         return decode(row, depth);
     } catch (const DecodeError& error) {
-        m_problems << QStringLiteral("%1 is damaged and was left out: %2")
-                          .arg(describe(id), QString::fromStdString(error.what()));
+        noteDamaged(id, error);
         return {};
     }
 }
@@ -56,20 +55,33 @@ std::vector<std::shared_ptr<BaseObject>> StoredObjectReader::readAll(const std::
         try {
             objects.push_back(decode(row, depth));
         } catch (const DecodeError& error) {
-            m_problems << QStringLiteral("%1 is damaged and was left out: %2")
-                              .arg(describe(row.id), QString::fromStdString(error.what()));
+            noteDamaged(row.id, error);
         }
     }
     return objects;
 }
 
-StoredObjectReader::Row StoredObjectReader::fetch(const std::string& id, const std::string& expectedType)
+void StoredObjectReader::noteDamaged(const std::string& id, const DecodeError& error)
+{
+    m_problems << QStringLiteral("%1 is damaged and was left out: %2")
+                      .arg(describe(id), QString::fromStdString(error.what()));
+}
+
+std::optional<StoredObjectReader::Row> StoredObjectReader::findRow(const std::string& id)
 {
     QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data FROM objects WHERE id = ?"),
                                      {QString::fromStdString(id)});
     if (!query.next())
+        return std::nullopt;
+    return Row{id, query.value(0).toString().toStdString(), query.value(1).toByteArray()};
+}
+
+StoredObjectReader::Row StoredObjectReader::fetch(const std::string& id, const std::string& expectedType)
+{
+    const std::optional<Row> found = findRow(id);
+    if (!found)
         throw StoreError("there is no stored object with the id " + id);
-    Row row{id, query.value(0).toString().toStdString(), query.value(1).toByteArray()};
+    const Row& row = *found;
     if (!expectedType.empty() && row.type != expectedType)
         throw StoreError("the object " + id + " is a " + row.type + ", not a " + expectedType);
     return row;
@@ -98,15 +110,13 @@ void StoredObjectReader::resolveMembers(BaseObject& library, int depth)
     const std::string memberType = library.referencedTypeId();
     std::vector<std::string> leftOut;
     library.resolveReferences([&](const std::string& memberId) -> std::shared_ptr<BaseObject> {
-        QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data FROM objects WHERE id = ?"),
-                                         {QString::fromStdString(memberId)});
-        if (!query.next()) {
+        const std::optional<Row> found = findRow(memberId);
+        if (!found) {
             // Deleted since the library was stored: no longer a member.
             leftOut.push_back(memberId);
             return {};
         }
-        const Row row{memberId, query.value(0).toString().toStdString(), query.value(1).toByteArray()};
-        query.finish();
+        const Row& row = *found;
         try {
             if (!memberType.empty() && row.type != memberType)
                 throw DecodeError("object " + memberId + " is a " + row.type + ", not a " + memberType);

@@ -4,12 +4,14 @@
 #include <QStringList>
 
 #include <memory>
+#include <optional>
 #include <string>
 #include <vector>
 
 namespace vemi {
 
 class BaseObject;
+class DecodeError;
 class StoreDatabase;
 
 // Reads stored objects and decodes them; at depth 2 or more the objects that
@@ -46,8 +48,11 @@ private:
         QByteArray data;
     };
 
+    // Nothing when there is no object of the id.
+    std::optional<Row> findRow(const std::string& id);
     // Throws StoreError when there is no such object or it has another type.
     Row fetch(const std::string& id, const std::string& expectedType);
+    void noteDamaged(const std::string& id, const DecodeError& error);
     // Throws DecodeError when the row is damaged.
     std::shared_ptr<BaseObject> decode(const Row& row, int depth);
     void resolveMembers(BaseObject& library, int depth);

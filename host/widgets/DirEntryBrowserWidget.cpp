@@ -346,17 +346,8 @@ void DirEntryBrowserWidget::openObject()
     }
     QString title = m_actionOpen->text();
     title.remove(QLatin1Char('&')).remove(QChar(0x2026));
-    // The dialog runs its own event loop, in which answers from the store may
-    // rebuild the tree: it answers with a serial, not a node, and dies with
-    // this browser should that close meanwhile.
-    QPointer<TreePickerDialog> picker =
-        new TreePickerDialog(*m_model, TreePickerDialog::Choice::Entry, title, m_plural + QLatin1Char(':'), this);
-    picker->preselect(currentNode());
-    picker->exec();
-    if (!picker)
-        return;
-    const std::optional<quint64> chosen = picker->chosenSerial();
-    delete picker;
+    const std::optional<quint64> chosen = TreePickerDialog::choose(
+        *m_model, TreePickerDialog::Choice::Entry, title, m_plural + QLatin1Char(':'), this, currentNode());
     if (Node* node = chosen ? m_model->findBySerial(*chosen) : nullptr)
         selectNode(node);
 }

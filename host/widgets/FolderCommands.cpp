@@ -142,16 +142,10 @@ void FolderCommands::move(const QVector<Node*>& nodes)
 std::optional<quint64> FolderCommands::askTargetFolder(const QVector<Node*>& nodes)
 {
     const std::vector<const Node*> moving(nodes.begin(), nodes.end());
-    // The dialog dies with its parent, should that close while it is open.
-    QPointer<TreePickerDialog> picker = new TreePickerDialog(*m_model, TreePickerDialog::Choice::Folder,
-                                                             tr("Move To"), tr("Folder:"), m_dialogParent, moving);
-    picker->preselect(dynamic_cast<const DirEntryTreeModel::FolderNode*>(nodes.first()->parent()));
-    picker->exec();
-    if (!picker)
-        return std::nullopt;
-    const std::optional<quint64> chosen = picker->chosenSerial();
-    delete picker;
-    return chosen;
+    return TreePickerDialog::choose(*m_model, TreePickerDialog::Choice::Folder, tr("Move To"), tr("Folder:"),
+                                    m_dialogParent,
+                                    dynamic_cast<const DirEntryTreeModel::FolderNode*>(nodes.first()->parent()),
+                                    moving);
 }
 
 void FolderCommands::remove(const QVector<Node*>& nodes)

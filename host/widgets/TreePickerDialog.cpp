@@ -3,6 +3,7 @@
 #include <QDialogButtonBox>
 #include <QGuiApplication>
 #include <QLabel>
+#include <QPointer>
 #include <QPushButton>
 #include <QScreen>
 #include <QScrollBar>
@@ -168,6 +169,20 @@ void TreePickerDialog::fitToScreen()
     const int height = std::min(PreferredHeight, available.height() * 2 / 3);
     setMaximumSize(available.size());
     resize(width, height);
+}
+
+std::optional<quint64> TreePickerDialog::choose(const BaseObjectTreeModel& model, Choice choice, const QString& title,
+                                                const QString& label, QWidget* parent, const Node* preselected,
+                                                const std::vector<const Node*>& excluded)
+{
+    QPointer<TreePickerDialog> picker = new TreePickerDialog(model, choice, title, label, parent, excluded);
+    picker->preselect(preselected);
+    picker->exec();
+    if (!picker)
+        return std::nullopt;
+    const std::optional<quint64> chosen = picker->chosenSerial();
+    delete picker;
+    return chosen;
 }
 
 } // namespace vemi

@@ -42,6 +42,14 @@ public:
 
     static QString topLevelText();
 
+    // Runs a picker modally with preselected current; the serial chosen, or
+    // nothing when cancelled. The picker runs its own event loop, in which the
+    // tree may be rebuilt (hence a serial, not a node) and parent may close
+    // (then the picker dies with it and nothing is chosen).
+    static std::optional<quint64> choose(const BaseObjectTreeModel& model, Choice choice, const QString& title,
+                                         const QString& label, QWidget* parent, const Node* preselected,
+                                         const std::vector<const Node*>& excluded = {});
+
 private:
     void addChildren(const Node* parent, QStandardItem* into, int depth, const std::vector<const Node*>& excluded);
     QStandardItem* itemFor(const Node* node, int depth);
