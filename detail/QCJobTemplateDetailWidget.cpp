@@ -183,8 +183,7 @@ void QCJobTemplateDetailWidget::reloadFromModel()
 }
 
 // The group box title carries the template's name; a long name is cut at the
-// pane's edge (the box's minimum width is fixed in the form, the tool tip
-// shows the name whole) instead of widening the window beyond the screen.
+// pane's edge instead of widening the window, so the tool tip shows it whole.
 void QCJobTemplateDetailWidget::showTemplateName(const QString& name)
 {
     m_ui->checkZoneGroupBox->setTitle(tr("Checkpoints for: ") + name);

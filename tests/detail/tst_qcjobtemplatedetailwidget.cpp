@@ -394,9 +394,13 @@ void tst_QCJobTemplateDetailWidget::splitterStatesSurviveARestart()
 
 void tst_QCJobTemplateDetailWidget::longTemplateNameDoesNotWidenTheEditor()
 {
+    m_widget->show();
+    QVERIFY(QTest::qWaitForWindowExposed(m_widget.get()));
     open(named<QCJobTemplate>("Short"));
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::LayoutRequest);
     const int width = m_widget->minimumSizeHint().width();
     open(named<QCJobTemplate>(std::string(400, 'W')));
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::LayoutRequest);
     QCOMPARE(m_widget->minimumSizeHint().width(), width);
     QCOMPARE(child<QGroupBox>("checkZoneGroupBox")->toolTip(), QString(400, 'W'));
 }
