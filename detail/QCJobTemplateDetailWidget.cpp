@@ -1,59 +1,574 @@
 #include "detail/QCJobTemplateDetailWidget.h"
+#include "ui_QCJobTemplateDetailWidget.h"
 
+#include "host/client/GeneralSettings.h"
+#include "host/client/ToleranceFactory.h"
+#include "host/domain/AppearanceValues.h"
+#include "host/domain/ColorStandardsLibrary.h"
+#include "host/domain/ColorimetricCondition.h"
+#include "host/domain/GlobalDirEntry.h"
+#include "host/domain/LabToleranceBase.h"
+#include "host/domain/LabValue.h"
+#include "host/domain/MeasurementConfiguration.h"
+#include "host/domain/PropertyLibrary.h"
 #include "host/domain/QCJobTemplate.h"
+#include "host/domain/RGBValue.h"
+#include "host/domain/SchematicImage.h"
+#include "host/domain/Standard.h"
+#include "host/domain/TagDefinition.h"
+#include "host/domain/TagValue.h"
+#include "host/domain/ToleranceSet.h"
+#include "host/instruments/InstrumentManager.h"
+#include "host/store/EntryObjectFetch.h"
+#include "host/store/ErrorInfo.h"
+#include "host/store/GetMarloObjectResponse.h"
+#include "host/store/HostMetaTypes.h"
+#include "host/widgets/ImageRepository.h"
+#include "host/widgets/ObjectBrowserDialog.h"
+#include "host/widgets/SelectedPath.h"
+#include "host/widgets/TagDefinitionDialog.h"
+#include "host/widgets/UIHelper.h"
 #include "model/QCJobTemplateModel.h"
+#include "plugin/PellamSettingsKeys.h"
 
-#include <QLabel>
-#include <QVBoxLayout>
+#include <QGraphicsPixmapItem>
+#include <QGraphicsScene>
+#include <QMessageBox>
+#include <QSettings>
+
+#include <algorithm>
+#include <functional>
 
 namespace vemi {
+
+namespace {
+
+// The object of a fetch answer when it is of the expected type, else null.
+template <class T>
+std::shared_ptr<T> objectOfType(const std::shared_ptr<Response>& response)
+{
+    const auto answer = std::dynamic_pointer_cast<GetMarloObjectResponse>(response);
+    const auto object = answer ? answer->object() : nullptr;
+    if (!object || object->objectTypeId() != T::typeId())
+        return nullptr;
+    return std::dynamic_pointer_cast<T>(object);
+}
+
+bool isFetchAnswer(const std::shared_ptr<Response>& response)
+{
+    return std::dynamic_pointer_cast<GetMarloObjectResponse>(response) != nullptr;
+}
+
+bool hasDefinitionNamed(const std::vector<std::shared_ptr<TagDefinition>>& definitions, const std::string& name)
+{
+    return std::any_of(definitions.begin(), definitions.end(),
+                       [&name](const std::shared_ptr<TagDefinition>& d) { return d && d->name() == name; });
+}
+
+QIcon standardIcon(const QIcon& base, const Standard& standard)
+{
+    QIcon icon = base;
+    if (const auto rgb = standard.displayRGB()) {
+        QPixmap swatch(10, 10);
+        swatch.fill(UIHelper::toColor(*rgb));
+        icon.addPixmap(swatch, QIcon::Normal, QIcon::Off);
+        icon.addPixmap(swatch, QIcon::Selected, QIcon::Off);
+    }
+    return icon;
+}
+
+} // namespace
 
 QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget* parent,
                                                      std::shared_ptr<QCJobTemplateModel> model,
                                                      std::shared_ptr<GeneralSettings> generalSettings)
     : QWidget(parent)
     , m_store(store)
-    , m_model(std::move(model))
     , m_generalSettings(std::move(generalSettings))
-    , m_heading(new QLabel(this))
-    , m_summary(new QLabel(this))
+    , m_ui(new Ui::QCJobTemplateDetailWidget)
 {
-    setObjectName(QStringLiteral("QCJobTemplateDetailWidget"));
-    QFont headingFont = m_heading->font();
-    headingFont.setBold(true);
-    headingFont.setPointSizeF(headingFont.pointSizeF() * 1.3);
-    m_heading->setFont(headingFont);
-    // A long name is cut at the pane's edge (the tooltip shows it whole)
-    // instead of widening the window beyond the screen.
-    m_heading->setSizePolicy(QSizePolicy::Ignored, QSizePolicy::Preferred);
-    m_heading->setTextFormat(Qt::PlainText);
-    m_summary->setWordWrap(true);
-    m_summary->setTextFormat(Qt::PlainText);
+    m_ui->setupUi(this);
 
-    auto* layout = new QVBoxLayout(this);
-    layout->addWidget(m_heading);
-    layout->addWidget(m_summary);
-    layout->addStretch(1);
+    m_scene = std::make_unique<QGraphicsScene>();
+    m_ui->schematicGraphicsView->setScene(m_scene.get());
+
+    m_model = std::move(model);
+
+    m_ui->schematicGraphicsView->setToolTip(tr("Select an image for Job Schematic."));
+    m_ui->schematicToolbar->setAttribute(Qt::WA_NoSystemBackground);
+    m_ui->schematicToolbar->setAttribute(Qt::WA_TranslucentBackground);
+
+    InstrumentManager* instruments = InstrumentManager::instance();
+    connect(instruments, SIGNAL(sgInstrumentConnected(std::shared_ptr<vemi::Instrument>)), this,
+            SLOT(onInstrumentConnected(std::shared_ptr<vemi::Instrument>)));
+    connect(instruments, SIGNAL(sgInstrumentDisconnected(std::shared_ptr<vemi::Instrument>)), this,
+            SLOT(onInstrumentDisconnected(std::shared_ptr<vemi::Instrument>)));
+    connect(instruments, SIGNAL(sgPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>)), this,
+            SLOT(onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>)));
+    connect(m_model.get(), &QCJobTemplateModel::sgSetTemplateSavable, this,
+            &QCJobTemplateDetailWidget::onTemplateSavable);
+    connect(m_ui->tagDisplayWidget, SIGNAL(tagRowsSelected(int, QStringList)), this,
+            SLOT(tagRowsSelected(int, QStringList)));
+    connect(m_ui->tagDisplayWidget, SIGNAL(tagRowDoubleClicked(int, std::string)), this,
+            SLOT(tagEditSelected(int, std::string)));
+
+    m_tolerancePath = loadSelectedPath(PellamKeys::TolerancePathGroup);
+    m_libraryPath = loadSelectedPath(PellamKeys::LibraryPathGroup);
+    m_standardPath = loadSelectedPath(PellamKeys::StandardPathGroup);
+    m_propertyPath = loadSelectedPath(PellamKeys::PropertyPathGroup);
+
+    for (QWidget* button : {m_ui->cropSchematicButton, m_ui->resetZoomButton, m_ui->fitToWindowButton,
+                            m_ui->zoomInButton, m_ui->zoomOutButton})
+        button->hide();
+    m_ui->needMeasureConfigNotice->hide();
+
+    QSettings settings;
+    m_ui->horizontalSplitter->restoreState(settings.value(PellamKeys::HorizontalSplitterState).toByteArray());
+    m_ui->qcJobTemplateSplitter->restoreState(settings.value(PellamKeys::QcJobTemplateSplitterState).toByteArray());
 }
 
-QCJobTemplateDetailWidget::~QCJobTemplateDetailWidget() = default;
+QCJobTemplateDetailWidget::~QCJobTemplateDetailWidget()
+{
+    QSettings settings;
+    settings.setValue(PellamKeys::HorizontalSplitterState, m_ui->horizontalSplitter->saveState());
+    settings.setValue(PellamKeys::QcJobTemplateSplitterState, m_ui->qcJobTemplateSplitter->saveState());
+    // The view dies with the form, after the scene; it must not draw a deleted scene.
+    m_ui->schematicGraphicsView->setScene(nullptr);
+    delete m_ui;
+}
 
 void QCJobTemplateDetailWidget::reloadFromModel()
 {
     const auto jobTemplate = m_model->jobTemplate();
-    if (!jobTemplate) {
-        m_heading->clear();
-        m_heading->setToolTip(QString());
-        m_summary->clear();
+    if (!jobTemplate)
+        return;
+    showTemplateName(QString::fromStdString(jobTemplate->name()));
+    m_ui->enableRepeatCheckBox->setChecked(jobTemplate->enableRepeat());
+
+    clearSchematicScene();
+    const auto schematic = jobTemplate->schematicImage();
+    if (schematic && schematic->imageData().size() > 100) {
+        const auto& bytes = schematic->imageData();
+        QImage image;
+        image.loadFromData(bytes.data(), int(bytes.size()), schematic->format().c_str());
+        showSchematicImage(image);
+        setSchematicControlsEnabled(true);
+    }
+    const QString schematicName = schematic ? QString::fromStdString(schematic->name()) : QString();
+    m_ui->schematicNameLabel->setText(schematicName);
+    m_ui->schematicNameLabel->setToolTip(schematicName);
+
+    m_ui->descriptionEdit->setText(QString::fromStdString(jobTemplate->description()));
+
+    m_ui->needMeasureConfigNotice->hide();
+    if (const auto configuration = jobTemplate->measurementConfiguration()) {
+        m_ui->MeasConfigurationNameLabel->setText(QString::fromStdString(configuration->name()));
+    } else {
+        m_ui->MeasConfigurationNameLabel->setText(QString());
+        m_ui->needMeasureConfigNotice->show();
+        m_ui->tabWidget->setCurrentIndex(2);
+    }
+
+    m_ui->tagDisplayWidget->setTags(jobTemplate->tagValues(), jobTemplate->tagDefinitions());
+
+    for (QWidget* control : {static_cast<QWidget*>(m_ui->browseSchematicButton), static_cast<QWidget*>(m_ui->addProperty),
+                             static_cast<QWidget*>(m_ui->addPropertyLibrary), static_cast<QWidget*>(m_ui->libraryLoadButton),
+                             static_cast<QWidget*>(m_ui->addStandardButton), static_cast<QWidget*>(m_ui->descriptionEdit),
+                             static_cast<QWidget*>(m_ui->clearAllStandards),
+                             static_cast<QWidget*>(m_ui->addMeasurementConfigurationButton)})
+        control->setEnabled(true);
+
+    fillStandardsList();
+    fillToleranceList();
+}
+
+// The group box title carries the template's name; a long name is cut at the
+// pane's edge instead of widening the window, so the tool tip shows it whole.
+void QCJobTemplateDetailWidget::showTemplateName(const QString& name)
+{
+    m_ui->checkZoneGroupBox->setTitle(tr("Checkpoints for: ") + name);
+    m_ui->checkZoneGroupBox->setToolTip(name);
+}
+
+void QCJobTemplateDetailWidget::onTemplateSavable()
+{
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::emitModified()
+{
+    emit sgJobTemplateWasModified(m_model->jobTemplate());
+}
+
+// --- Description and repeat flag
+
+void QCJobTemplateDetailWidget::on_descriptionEdit_textEdited(QString)
+{
+    emitModified();
+    m_model->setDescription(m_ui->descriptionEdit->text().toStdString());
+}
+
+void QCJobTemplateDetailWidget::on_enableRepeatCheckBox_clicked()
+{
+    m_model->setEnableRepeat(m_ui->enableRepeatCheckBox->isChecked());
+    emitModified();
+}
+
+// --- Standards, tolerances and properties
+
+void QCJobTemplateDetailWidget::fillStandardsList()
+{
+    const auto standards = m_model->standards();
+    m_ui->standardsListWidget->clear();
+    if (standards.empty())
+        return;
+    const QIcon base = ImageRepository::instance().iconForType(Standard::typeId(), 1);
+    for (const auto& standard : standards) {
+        if (!standard)
+            continue;
+        auto* item = new QListWidgetItem(standardIcon(base, *standard), QString::fromStdString(standard->name()));
+        item->setData(Qt::UserRole, QVariant::fromValue(std::shared_ptr<BaseObject>(standard)));
+        m_ui->standardsListWidget->addItem(item);
+    }
+}
+
+void QCJobTemplateDetailWidget::fillToleranceList()
+{
+    const auto sets = m_model->sharedToleranceSets();
+    m_ui->defaultToleranceList->clear();
+    if (sets.empty()) {
+        m_ui->removeToleranceButton->hide();
+    } else {
+        const QIcon icon = ImageRepository::instance().iconForType(Tolerance::typeId(), 0);
+        for (const auto& set : sets) {
+            auto* item = new QListWidgetItem(icon, set ? QString::fromStdString(set->name()) : QString());
+            item->setData(Qt::UserRole, QVariant::fromValue(std::shared_ptr<BaseObject>(set)));
+            m_ui->defaultToleranceList->addItem(item);
+        }
+        m_ui->removeToleranceButton->show();
+    }
+    // A template takes a second default set through this button, not a third.
+    m_ui->insertToleranceButton->setVisible(sets.size() < 2);
+}
+
+void QCJobTemplateDetailWidget::on_clearAllStandards_clicked()
+{
+    m_model->removeAllStandards();
+    fillStandardsList();
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::on_removeToleranceButton_clicked()
+{
+    m_model->removeAllToleranceSets();
+    fillToleranceList();
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::tagRowsSelected(int index, QStringList)
+{
+    m_ui->removeTag->setEnabled(index >= 0);
+}
+
+// The values are not indexed like the definitions (a definition without a
+// default adds no value), so each removed definition takes the values that
+// name it, wherever they stand.
+void QCJobTemplateDetailWidget::on_removeTag_clicked()
+{
+    std::vector<int> rows = m_ui->tagDisplayWidget->getSelectedRows();
+    if (!rows.empty()) {
+        std::sort(rows.begin(), rows.end(), std::greater<int>());
+        auto definitions = m_model->tagDefinitions();
+        auto values = m_model->tagValues();
+        for (int row : rows) {
+            if (row < 0 || row >= int(definitions.size()))
+                continue;
+            const std::string id = definitions[std::size_t(row)] ? definitions[std::size_t(row)]->id() : std::string();
+            definitions.erase(definitions.begin() + row);
+            values.erase(std::remove_if(values.begin(), values.end(),
+                                        [&id](const std::shared_ptr<TagValue>& v) {
+                                            return v && v->definitionId() == id;
+                                        }),
+                         values.end());
+        }
+        m_model->setTagDefinitions(definitions);
+        m_model->setTagValues(values);
+        m_ui->tagDisplayWidget->setTags(values, definitions);
+        emitModified();
+    }
+    m_ui->removeTag->setEnabled(false);
+    m_ui->tagDisplayWidget->clearSelections();
+}
+
+void QCJobTemplateDetailWidget::tagEditSelected(int index, std::string)
+{
+    m_ui->removeTag->setEnabled(false);
+    const auto definitions = m_model->tagDefinitions();
+    if (index >= 0 && index < int(definitions.size())) {
+        auto values = m_model->tagValues();
+        TagDefinitionDialog dialog(this);
+        if (dialog.edit(m_store, values, definitions[std::size_t(index)])) {
+            m_model->setTagValues(values);
+            m_ui->tagDisplayWidget->setTags(values, definitions);
+            emitModified();
+        }
+    }
+    m_ui->tagDisplayWidget->clearSelections();
+}
+
+bool QCJobTemplateDetailWidget::findConditionMismatch(const std::shared_ptr<ToleranceSet>& set,
+                                                      QString* standardName, QString* standardCondition,
+                                                      QString* toleranceCondition) const
+{
+    const auto jobTemplate = m_model->jobTemplate();
+    if (set->tolerances().empty() || !jobTemplate)
+        return false;
+    const auto built = ToleranceFactory::toleranceFactory()->buildToleranceSet(set);
+    const auto builtTolerances = built ? built->tolerances() : std::vector<std::shared_ptr<Tolerance>>();
+    const auto lab = builtTolerances.empty() ? nullptr
+                                             : std::dynamic_pointer_cast<LabToleranceBase>(builtTolerances.front());
+    const auto condition = lab ? lab->colorimetricCondition() : nullptr;
+    if (!condition)
+        return false;
+    const std::string wanted = condition->toString();
+    for (const auto& standard : jobTemplate->standards()) {
+        const auto appearance = standard ? standard->appearanceValues(0) : nullptr;
+        const auto colours = appearance ? appearance->colorValues() : std::vector<std::shared_ptr<ColorValue>>();
+        const auto labValue = colours.empty() ? nullptr : std::dynamic_pointer_cast<LabValue>(colours.front());
+        if (!labValue || labValue->colorimetricCondition() == wanted)
+            continue;
+        *standardName = QString::fromStdString(standard->name());
+        *standardCondition = QString::fromStdString(labValue->colorimetricCondition());
+        *toleranceCondition = QString::fromStdString(wanted);
+        return true;
+    }
+    return false;
+}
+
+void QCJobTemplateDetailWidget::onNewToleranceLoaded(std::shared_ptr<Response> response)
+{
+    if (!isFetchAnswer(response))
+        return;
+    const auto set = objectOfType<ToleranceSet>(response);
+    if (!set) {
+        fillToleranceList();
         return;
     }
-    const QString name = QString::fromStdString(jobTemplate->name());
-    m_heading->setText(name);
-    m_heading->setToolTip(name);
-    const QString description = QString::fromStdString(jobTemplate->description());
-    m_summary->setText(tr("%1\n\nCheckpoints: %2")
-                           .arg(description.isEmpty() ? tr("No description.") : description,
-                                QString::number(jobTemplate->checkPoints().size())));
+    QString standardName, standardCondition, toleranceCondition;
+    if (findConditionMismatch(set, &standardName, &standardCondition, &toleranceCondition)) {
+        QMessageBox::information(this, tr("Colorimetric Condition mismatch"),
+                                 tr("Your standard \"%1\" uses %2, while the tolerance you want to add uses %3")
+                                     .arg(standardName, standardCondition, toleranceCondition),
+                                 QMessageBox::Ok);
+        return;
+    }
+    auto sets = m_model->sharedToleranceSets();
+    sets.push_back(set);
+    m_model->setSharedToleranceSets(sets);
+    emitModified();
+    fillToleranceList();
 }
+
+// --- Pickers
+
+void QCJobTemplateDetailWidget::on_addStandardButton_clicked()
+{
+    runPicker({QT_TR_NOOP("Add selected standard(s)"), Standard::typeId(), &m_standardPath, false, 2,
+               &QCJobTemplateDetailWidget::onNewStandardLoaded});
+}
+
+void QCJobTemplateDetailWidget::on_libraryLoadButton_clicked()
+{
+    runPicker({QT_TR_NOOP("Add standards in selected library"), ColorStandardsLibrary::typeId(), &m_propertyPath,
+               true, 2, &QCJobTemplateDetailWidget::onColorLibraryLoaded});
+}
+
+void QCJobTemplateDetailWidget::on_addProperty_clicked()
+{
+    runPicker({QT_TR_NOOP("Select properties to insert"), TagDefinition::typeId(), &m_propertyPath, false, 0,
+               &QCJobTemplateDetailWidget::onPropertyLoaded});
+}
+
+void QCJobTemplateDetailWidget::on_addPropertyLibrary_clicked()
+{
+    runPicker({QT_TR_NOOP("Add properties in selected library"), PropertyLibrary::typeId(), &m_propertyPath, true,
+               2, &QCJobTemplateDetailWidget::onPropertyLibraryLoaded});
+}
+
+void QCJobTemplateDetailWidget::on_insertToleranceButton_clicked()
+{
+    runPicker({QT_TR_NOOP("Select a default tolerance"), ToleranceSet::typeId(), &m_tolerancePath, true, 0,
+               &QCJobTemplateDetailWidget::onNewToleranceLoaded});
+}
+
+void QCJobTemplateDetailWidget::runPicker(const Picker& picker)
+{
+    ObjectBrowserDialog dialog(m_store, this);
+    dialog.initialize(true, false, {picker.typeId}, tr(picker.title), false);
+    dialog.setDispatcherList(m_generalSettings ? m_generalSettings->dispatcherList() : std::vector<std::string>());
+    dialog.setLastSelectedPath(*picker.position);
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    *picker.position = dialog.lastSelectedPath();
+    saveSelectedPaths();
+    const auto entries = dialog.selectedDirEntries();
+    for (const auto& entry : entries) {
+        if (entry)
+            fetchEntry(*entry, picker.depth, picker.onResponse);
+        if (picker.firstEntryOnly)
+            break;
+    }
+}
+
+// The entry names its own store, so an object chosen in another store is
+// fetched from there. A failed fetch changes nothing; its cause is logged.
+void QCJobTemplateDetailWidget::fetchEntry(const GlobalDirEntry& entry, int depth, ResponseSlot onResponse)
+{
+    EntryObjectFetch::fetch(
+        m_store, entry, std::string(), this,
+        [this, onResponse](const std::shared_ptr<BaseObject>& object) {
+            (this->*onResponse)(std::make_shared<GetMarloObjectResponse>(object));
+        },
+        [](const std::shared_ptr<ErrorInfo>& error) {
+            qWarning("%s", qPrintable(error ? error->message() : QStringLiteral("Cannot fetch an object.")));
+        },
+        depth > 0 ? depth : 1);
+}
+
+std::shared_ptr<SelectedPath> QCJobTemplateDetailWidget::loadSelectedPath(const QString& group)
+{
+    QSettings settings;
+    settings.beginGroup(group);
+    const QString path = settings.value(PellamKeys::LastSelectedPath).toString();
+    const QString dispatcherId = settings.value(PellamKeys::DispatcherId).toString();
+    settings.endGroup();
+    return std::make_shared<SelectedPath>(dispatcherId.toStdString(), SelectedPath::pathFromString(path.toStdString()));
+}
+
+void QCJobTemplateDetailWidget::saveSelectedPaths() const
+{
+    const std::pair<const QString&, const std::shared_ptr<SelectedPath>&> positions[] = {
+        {PellamKeys::LibraryPathGroup, m_libraryPath},
+        {PellamKeys::StandardPathGroup, m_standardPath},
+        {PellamKeys::TolerancePathGroup, m_tolerancePath},
+        {PellamKeys::PropertyPathGroup, m_propertyPath}};
+    QSettings settings;
+    for (const auto& [group, position] : positions) {
+        if (!position)
+            continue;
+        settings.beginGroup(group);
+        settings.setValue(PellamKeys::LastSelectedPath,
+                          QString::fromStdString(SelectedPath::pathToString(position->path())));
+        settings.setValue(PellamKeys::DispatcherId, QString::fromStdString(position->dispatcherId()));
+        settings.endGroup();
+    }
+}
+
+void QCJobTemplateDetailWidget::onNewStandardLoaded(std::shared_ptr<Response> response)
+{
+    if (!isFetchAnswer(response))
+        return;
+    if (const auto standard = objectOfType<Standard>(response)) {
+        const auto standards = m_model->standards();
+        const bool known = std::any_of(standards.begin(), standards.end(), [&standard](const auto& s) {
+            return s && s->name() == standard->name();
+        });
+        if (!known)
+            m_model->addStandard(standard);
+        emitModified();
+    }
+    fillStandardsList();
+}
+
+void QCJobTemplateDetailWidget::onColorLibraryLoaded(std::shared_ptr<Response> response)
+{
+    if (!isFetchAnswer(response))
+        return;
+    if (const auto library = objectOfType<ColorStandardsLibrary>(response)) {
+        m_model->setStandardsFromLibrary(library);
+        emitModified();
+    }
+    fillStandardsList();
+}
+
+void QCJobTemplateDetailWidget::onPropertyLoaded(std::shared_ptr<Response> response)
+{
+    const auto definition = objectOfType<TagDefinition>(response);
+    if (!definition)
+        return;
+    auto definitions = m_model->tagDefinitions();
+    auto values = m_model->tagValues();
+    if (hasDefinitionNamed(definitions, definition->name()))
+        return;
+    definitions.push_back(definition);
+    if (!definition->defaultValue().empty())
+        values.push_back(TagValue::forDefinition(*definition, definition->defaultValue()));
+    m_model->setTagDefinitions(definitions);
+    m_model->setTagValues(values);
+    m_ui->tagDisplayWidget->setTags(values, definitions);
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::onPropertyLibraryLoaded(std::shared_ptr<Response> response)
+{
+    const auto library = objectOfType<PropertyLibrary>(response);
+    if (!library)
+        return;
+    for (const auto& property : library->properties()) {
+        auto definitions = m_model->tagDefinitions();
+        if (!property || hasDefinitionNamed(definitions, property->name()))
+            continue;
+        auto values = m_model->tagValues();
+        definitions.push_back(property);
+        if (!property->defaultValue().empty())
+            values.push_back(TagValue::forDefinition(*property, property->defaultValue()));
+        m_model->setTagDefinitions(definitions);
+        m_model->setTagValues(values);
+        m_ui->tagDisplayWidget->setTags(values, definitions);
+    }
+    emitModified();
+}
+
+// --- Schematic pane and measurement configuration: their behaviour is not
+// part of this editor yet; the controls exist so the form is complete.
+
+void QCJobTemplateDetailWidget::clearSchematicScene()
+{
+    m_scene->clear();
+    setSchematicControlsEnabled(false);
+}
+
+void QCJobTemplateDetailWidget::showSchematicImage(const QImage& image)
+{
+    if (image.isNull())
+        return;
+    m_scene->addPixmap(QPixmap::fromImage(image));
+    m_scene->setSceneRect(m_scene->itemsBoundingRect());
+}
+
+void QCJobTemplateDetailWidget::setSchematicControlsEnabled(bool on)
+{
+    for (QWidget* button : {m_ui->cropSchematicButton, m_ui->clearSchematicButton, m_ui->resetZoomButton,
+                            m_ui->fitToWindowButton, m_ui->zoomInButton, m_ui->zoomOutButton})
+        button->setEnabled(on);
+}
+
+void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::on_cropSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::on_fitToWindowButton_clicked() {}
+void QCJobTemplateDetailWidget::on_resetZoomButton_clicked() {}
+void QCJobTemplateDetailWidget::on_clearSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::onSavedMc(std::shared_ptr<vemi::Response>) {}
+void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo>) {}
+void QCJobTemplateDetailWidget::onSaveProgress(std::shared_ptr<vemi::Response>) {}
+void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int) {}
+void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked() {}
+void QCJobTemplateDetailWidget::on_zoomInButton_clicked() {}
+void QCJobTemplateDetailWidget::on_zoomOutButton_clicked() {}
+
+// Instrument events need no action in the template editor.
+void QCJobTemplateDetailWidget::onInstrumentConnected(std::shared_ptr<vemi::Instrument>) {}
+void QCJobTemplateDetailWidget::onInstrumentDisconnected(std::shared_ptr<vemi::Instrument>) {}
+void QCJobTemplateDetailWidget::onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>) {}
 
 } // namespace vemi

@@ -1,20 +1,38 @@
 #pragma once
 
+#include <QString>
+#include <QStringList>
 #include <QWidget>
 
 #include <memory>
+#include <string>
 
 class QCJobTemplateModel;
-class QLabel;
+class QGraphicsScene;
+class QImage;
+
+namespace Ui {
+class QCJobTemplateDetailWidget;
+}
 
 namespace vemi {
 
+class ErrorInfo;
 class GeneralSettings;
+class GlobalDirEntry;
+class Instrument;
 class MarloModel;
+class ObjectBrowserDialog;
 class QCJobTemplate;
+class Response;
+class SelectedPath;
+class ToleranceSet;
 
-// The editor of the job template that is open in the browser. It shows
-// which template is open; the editing panes build on it.
+// The editor of the job template that is open in the browser: description,
+// properties, standards, measurement configuration, default tolerances, the
+// repeat flag, the check list and the schematic. Every edit goes through the
+// shared template model and ends in sgJobTemplateWasModified. GUI thread only;
+// the store model must outlive the widget.
 class QCJobTemplateDetailWidget : public QWidget
 {
     Q_OBJECT
@@ -24,19 +42,91 @@ public:
                               std::shared_ptr<GeneralSettings> generalSettings);
     ~QCJobTemplateDetailWidget() override;
 
-    // Shows the model's template again, from scratch.
+    // Shows the model's template again, from scratch; the model must hold one.
+    // Emits nothing.
     void reloadFromModel();
 
 signals:
-    // Every edit made here ends in this signal with the edited template.
     void sgJobTemplateWasModified(std::shared_ptr<vemi::QCJobTemplate> jobTemplate);
 
+private slots:
+    void on_browseSchematicButton_clicked();
+    void on_cropSchematicButton_clicked();
+    void on_fitToWindowButton_clicked();
+    void on_resetZoomButton_clicked();
+    void on_clearSchematicButton_clicked();
+    void onSavedMc(std::shared_ptr<vemi::Response> response);
+    void onSaveError(std::shared_ptr<vemi::ErrorInfo> errorInfo);
+    void onSaveProgress(std::shared_ptr<vemi::Response> response);
+    void onColorLibraryLoaded(std::shared_ptr<Response> response);
+    void onPropertyLibraryLoaded(std::shared_ptr<Response> response);
+    void onNewStandardLoaded(std::shared_ptr<Response> response);
+    void onNewToleranceLoaded(std::shared_ptr<Response> response);
+    void onGrabRubberBandedImageArea(int cpIndex);
+    void on_addMeasurementConfigurationButton_clicked();
+    void on_zoomInButton_clicked();
+    void on_zoomOutButton_clicked();
+    void on_addProperty_clicked();
+    void on_libraryLoadButton_clicked();
+    void on_addStandardButton_clicked();
+    void on_clearAllStandards_clicked();
+    void on_removeTag_clicked();
+    void on_insertToleranceButton_clicked();
+    void on_removeToleranceButton_clicked();
+    void on_enableRepeatCheckBox_clicked();
+    void on_descriptionEdit_textEdited(QString arg1);
+    void on_addPropertyLibrary_clicked();
+
+protected slots:
+    void onInstrumentConnected(std::shared_ptr<vemi::Instrument> instrument);
+    void onInstrumentDisconnected(std::shared_ptr<vemi::Instrument> instrument);
+    void tagEditSelected(int index, std::string tagName);
+    void tagRowsSelected(int index, QStringList selectedTags);
+    void onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument> instrument);
+    void onPropertyLoaded(std::shared_ptr<Response> response);
+
 private:
+    using ResponseSlot = void (QCJobTemplateDetailWidget::*)(std::shared_ptr<Response>);
+
+    struct Picker
+    {
+        const char* title;
+        const std::string& typeId;
+        std::shared_ptr<SelectedPath>* position;
+        bool firstEntryOnly;
+        int depth;
+        ResponseSlot onResponse;
+    };
+
+    void onTemplateSavable();
+    void emitModified();
+    // Runs one picker: the dialog, the remembered position, one fetch per entry.
+    void runPicker(const Picker& picker);
+    void fetchEntry(const GlobalDirEntry& entry, int depth, ResponseSlot onResponse);
+    static std::shared_ptr<SelectedPath> loadSelectedPath(const QString& group);
+    void saveSelectedPaths() const;
+    void fillStandardsList();
+    void fillToleranceList();
+    // The name of the first standard whose colorimetric condition differs from
+    // that of the set's first Lab tolerance, with both conditions; false when
+    // the set may be added.
+    bool findConditionMismatch(const std::shared_ptr<ToleranceSet>& set, QString* standardName,
+                               QString* standardCondition, QString* toleranceCondition) const;
+    void clearSchematicScene();
+    void showSchematicImage(const QImage& image);
+    void setSchematicControlsEnabled(bool on);
+    void showTemplateName(const QString& name);
+
     MarloModel& m_store;
     std::shared_ptr<QCJobTemplateModel> m_model;
     std::shared_ptr<GeneralSettings> m_generalSettings;
-    QLabel* m_heading;
-    QLabel* m_summary;
+    Ui::QCJobTemplateDetailWidget* m_ui;
+    std::unique_ptr<QGraphicsScene> m_scene;
+    QString m_schematicPath;
+    std::shared_ptr<SelectedPath> m_libraryPath;
+    std::shared_ptr<SelectedPath> m_standardPath;
+    std::shared_ptr<SelectedPath> m_tolerancePath;
+    std::shared_ptr<SelectedPath> m_propertyPath;
 };
 
 } // namespace vemi

@@ -13,6 +13,7 @@
 #include "host/domain/Standard.h"
 
 #include <QAction>
+#include <QGroupBox>
 #include <QLabel>
 #include <QSplitter>
 #include <QSplitterHandle>
@@ -61,6 +62,12 @@ private:
     PellamWidget* createWidget();
     void select(const std::vector<Node*>& nodes);
     QStackedWidget* pages() const { return m_widget->findChild<QStackedWidget*>(); }
+    // The editor's group box whose title names the open template.
+    QGroupBox* editorHeading() const
+    {
+        return m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QGroupBox*>(
+            QStringLiteral("checkZoneGroupBox"));
+    }
 
     std::unique_ptr<TempStore> m_store;
     std::unique_ptr<QWidget> m_host;
@@ -211,8 +218,7 @@ void tst_PellamWidget::selectionDecidesPageAndTemplate()
     QCOMPARE(pages()->currentIndex(), page);
     QCOMPARE(m_widget->model()->jobTemplate(), templateLoaded ? opened : previous);
     QCOMPARE(loaded.count(), templateLoaded ? 1 : 0);
-    const QString heading = m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->text();
-    QCOMPARE(heading == QStringLiteral("Door Panel"), templateLoaded);
+    QCOMPARE(editorHeading()->title() == QStringLiteral("Checkpoints for: Door Panel"), templateLoaded);
 }
 
 void tst_PellamWidget::newTemplateIsNamedAndBecomesModelsTemplate()
@@ -226,8 +232,7 @@ void tst_PellamWidget::newTemplateIsNamedAndBecomesModelsTemplate()
     QCOMPARE(m_widget->model()->jobTemplate(), first);
     QVERIFY(first->schematicImage());
     QVERIFY(first->schematicImage()->imageData().empty());
-    QCOMPARE(m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->text(),
-             QStringLiteral("Job Template"));
+    QCOMPARE(editorHeading()->title(), QStringLiteral("Checkpoints for: Job Template"));
 
     browser->actionNew()->trigger();
     QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
@@ -243,15 +248,21 @@ void tst_PellamWidget::longTemplateNameKeepsTheWindowNarrow()
     auto opened = std::make_shared<QCJobTemplate>();
     opened->setName(QString(QStringLiteral("Left Inner Trim Gloss Check ")).repeated(12).toStdString());
     auto node = entryNodeHolding(opened);
+    auto shortName = std::make_shared<QCJobTemplate>();
+    shortName->setName("Door");
+    auto shortNode = entryNodeHolding(shortName);
     m_host->show();
+    // Measured with the editor shown once, since its style applies only then.
+    select({shortNode.get()});
+    QCoreApplication::sendPostedEvents(nullptr, QEvent::LayoutRequest);
     const int before = m_widget->minimumSizeHint().width();
     select({node.get()});
 
     QCOMPARE(pages()->currentIndex(), 1);
     QCoreApplication::sendPostedEvents(nullptr, QEvent::LayoutRequest);
-    // The heading is cut at the pane's edge rather than widening the tab.
+    // The name is cut at the pane's edge rather than widening the tab.
     QCOMPARE(m_widget->minimumSizeHint().width(), before);
-    QCOMPARE(m_widget->findChild<QCJobTemplateDetailWidget*>()->findChild<QLabel*>()->toolTip(),
+    QCOMPARE(editorHeading()->toolTip(),
              QString::fromStdString(opened->name()));
 }
 
