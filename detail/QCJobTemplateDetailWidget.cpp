@@ -159,6 +159,8 @@ void QCJobTemplateDetailWidget::reloadFromModel()
     m_ui->schematicNameLabel->setToolTip(schematicName);
 
     m_ui->descriptionEdit->setText(QString::fromStdString(jobTemplate->description()));
+    // The beginning of a long description shows, not its end.
+    m_ui->descriptionEdit->setCursorPosition(0);
 
     m_ui->needMeasureConfigNotice->hide();
     if (const auto configuration = jobTemplate->measurementConfiguration()) {

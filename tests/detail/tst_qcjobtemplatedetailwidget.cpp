@@ -322,6 +322,7 @@ void tst_QCJobTemplateDetailWidget::reloadLeavesNothingOfThePreviousTemplate()
     open(first);
     QCOMPARE(tabs->currentIndex(), 0); // a template with a configuration keeps the tab shown
     QCOMPARE(child<QLabel>("MeasConfigurationNameLabel")->text(), QStringLiteral("Spectro 45/0"));
+    QCOMPARE(child<QLineEdit>("descriptionEdit")->cursorPosition(), 0); // shows the description's beginning
 
     open(named<QCJobTemplate>("Second"));
 
