@@ -192,6 +192,12 @@ void QCJobTemplateDetailWidget::showTemplateName(const QString& name)
     m_ui->checkZoneGroupBox->setToolTip(name);
 }
 
+void QCJobTemplateDetailWidget::refreshTemplateName()
+{
+    if (const auto jobTemplate = m_model->jobTemplate())
+        showTemplateName(QString::fromStdString(jobTemplate->name()));
+}
+
 void QCJobTemplateDetailWidget::onTemplateSavable()
 {
     emitModified();

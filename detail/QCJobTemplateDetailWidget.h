@@ -45,6 +45,9 @@ public:
     // Shows the model's template again, from scratch; the model must hold one.
     // Emits nothing.
     void reloadFromModel();
+    // Shows the model's template's name again (after a rename in the browser);
+    // nothing else is reloaded, so an edit in progress is left alone.
+    void refreshTemplateName();
 
 signals:
     void sgJobTemplateWasModified(std::shared_ptr<vemi::QCJobTemplate> jobTemplate);

@@ -36,6 +36,8 @@ PellamWidget::PellamWidget(std::shared_ptr<PellamSettings>, std::shared_ptr<Gene
                 browser->namedObjectWasModified(jobTemplate);
             });
     connect(m_browser, &DirEntryBrowserWidget::sgSelectionChanged, this, &PellamWidget::onSelectionChanged);
+    // A rename in the browser renames the open template too: its title follows.
+    connect(treeModel, &QAbstractItemModel::dataChanged, m_detail, &QCJobTemplateDetailWidget::refreshTemplateName);
 
     m_splitter = new QSplitter(Qt::Horizontal, this);
     m_splitter->addWidget(m_browser);

@@ -57,6 +57,7 @@ private slots:
     void newTemplateIsNamedAndBecomesModelsTemplate();
     void longTemplateNameKeepsTheWindowNarrow();
     void editorModificationReachesBrowser();
+    void renameInBrowserRetitlesTheEditor();
 
 private:
     PellamWidget* createWidget();
@@ -286,6 +287,27 @@ void tst_PellamWidget::editorModificationReachesBrowser()
     emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
     QVERIFY(node->isModified());
     QVERIFY(browser->actionSave()->isEnabled());
+}
+
+void tst_PellamWidget::renameInBrowserRetitlesTheEditor()
+{
+    auto jobTemplate = std::make_shared<QCJobTemplate>();
+    jobTemplate->setName("Door Panel");
+    const std::string topLevel;
+    QVERIFY(m_store->save(jobTemplate, &topLevel));
+    delete m_widget;
+    m_widget = createWidget();
+    auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
+    QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
+    Node* node = browser->treeModel()->root()->children().front().get();
+    browser->treeView()->selectionModel()->setCurrentIndex(browser->treeModel()->indexFromNode(node),
+                                                           QItemSelectionModel::ClearAndSelect);
+    QTRY_COMPARE(pages()->currentIndex(), 1);
+    auto* group = m_widget->findChild<QGroupBox*>(QStringLiteral("checkZoneGroupBox"));
+    QTRY_COMPARE(group->title(), QStringLiteral("Checkpoints for: Door Panel"));
+
+    browser->treeModel()->renameNode(node, "Door Trim", {});
+    QTRY_COMPARE(group->title(), QStringLiteral("Checkpoints for: Door Trim"));
 }
 
 QC_TEST_MAIN(tst_PellamWidget)
