@@ -154,6 +154,8 @@ private slots:
     void pickersFetchAndRememberTheirPlace_data();
     void pickersFetchAndRememberTheirPlace();
     void propertyPositionIsSharedWithTheLibraryPicker();
+    void severalChosenEntries_data();
+    void severalChosenEntries();
     void unexpectedAnswersChangeNothing();
     void vanishedObjectIsReportedNotApplied();
 
@@ -165,7 +167,7 @@ private:
     // Stores object in the store named dispatcherId, in a new folder when folderName is given.
     std::string save(std::shared_ptr<NamedObject> object, const std::string& folderName = {},
                      const std::string& dispatcherId = {});
-    static void pickInNextDialog(QString store, QStringList path, QString entry, QString* title = nullptr,
+    static void pickInNextDialog(QString store, QStringList path, QStringList entries, QString* title = nullptr,
                                  std::shared_ptr<SelectedPath>* openedAt = nullptr,
                                  std::function<void()> beforeOk = {});
 
@@ -229,9 +231,9 @@ std::string tst_QCJobTemplateDetailWidget::save(std::shared_ptr<NamedObject> obj
 }
 
 // Chooses store in the next object browser, opens the folders of path,
-// selects entry there, runs beforeOk and presses OK; an empty entry cancels
+// selects the entries there, runs beforeOk and presses OK; no entries cancel
 // the dialog instead. The dialog is closed in every case.
-void tst_QCJobTemplateDetailWidget::pickInNextDialog(QString store, QStringList path, QString entry, QString* title,
+void tst_QCJobTemplateDetailWidget::pickInNextDialog(QString store, QStringList path, QStringList entries, QString* title,
                                                      std::shared_ptr<SelectedPath>* openedAt,
                                                      std::function<void()> beforeOk)
 {
@@ -245,7 +247,7 @@ void tst_QCJobTemplateDetailWidget::pickInNextDialog(QString store, QStringList 
             *title = dialog->windowTitle();
         if (openedAt)
             *openedAt = dialog->lastSelectedPath();
-        if (entry.isEmpty()) {
+        if (entries.isEmpty()) {
             dialog->reject();
             return;
         }
@@ -262,21 +264,28 @@ void tst_QCJobTemplateDetailWidget::pickInNextDialog(QString store, QStringList 
             }
             return QModelIndex();
         };
-        QModelIndex at;
-        for (const QString& name : path + QStringList{entry}) {
+        const auto waitFor = [&](const QModelIndex& parent, const QString& name) {
             QElapsedTimer clock;
             clock.start();
-            while (!find(at, name).isValid() && clock.elapsed() < 5000)
+            while (!find(parent, name).isValid() && clock.elapsed() < 5000)
                 QTest::qWait(10);
-            if (!find(at, name).isValid()) {
+            return find(parent, name);
+        };
+        QModelIndex folder;
+        for (const QString& name : path) {
+            folder = waitFor(folder, name);
+            tree->expand(folder);
+        }
+        tree->selectionModel()->clearSelection();
+        for (const QString& name : entries) {
+            const QModelIndex at = waitFor(folder, name);
+            if (!at.isValid()) {
                 dialog->reject();
                 QFAIL(qPrintable("the object browser does not list " + name));
             }
-            at = find(at, name);
-            tree->expand(at);
+            tree->selectionModel()->select(at, QItemSelectionModel::Select | QItemSelectionModel::Rows);
+            tree->selectionModel()->setCurrentIndex(at, QItemSelectionModel::NoUpdate);
         }
-        tree->selectionModel()->select(at, QItemSelectionModel::ClearAndSelect | QItemSelectionModel::Rows);
-        tree->setCurrentIndex(at);
         if (beforeOk)
             beforeOk();
         dialog->findChild<QDialogButtonBox*>(QStringLiteral("buttonBox"))->button(QDialogButtonBox::Ok)->click();
@@ -648,7 +657,7 @@ void tst_QCJobTemplateDetailWidget::pickersFetchAndRememberTheirPlace()
     open(jobTemplate);
 
     QString shownTitle;
-    pickInNextDialog(kSecondStore, {"Shelf"}, "Picked", &shownTitle);
+    pickInNextDialog(kSecondStore, {"Shelf"}, {"Picked"}, &shownTitle);
     QTest::mouseClick(m_widget->findChild<QToolButton*>(button), Qt::LeftButton);
     QCOMPARE(shownTitle, title);
     QTRY_COMPARE_WITH_TIMEOUT(m_modified->count(), 1, 5000);
@@ -675,17 +684,52 @@ void tst_QCJobTemplateDetailWidget::propertyPositionIsSharedWithTheLibraryPicker
 {
     save(definition("Picked"), "Shelf");
     open(named<QCJobTemplate>("T"));
-    pickInNextDialog({}, {"Shelf"}, "Picked");
+    pickInNextDialog({}, {"Shelf"}, {"Picked"});
     QTest::mouseClick(child<QToolButton>("addProperty"), Qt::LeftButton);
     QTRY_COMPARE_WITH_TIMEOUT(m_modified->count(), 1, 5000);
 
     std::shared_ptr<SelectedPath> openedAt;
-    pickInNextDialog({}, {}, QString(), nullptr, &openedAt);
+    pickInNextDialog({}, {}, {}, nullptr, &openedAt);
     QTest::mouseClick(child<QToolButton>("libraryLoadButton"), Qt::LeftButton);
     QVERIFY(openedAt);
     QCOMPARE(openedAt->path(), std::vector<std::string>{"Shelf"});
     // A cancelled picker keeps the positions as they were.
     QCOMPARE(QSettings().value("Opal QC/PropertyPath/LastSelectedPath").toString(), QStringLiteral("/Shelf"));
+}
+
+void tst_QCJobTemplateDetailWidget::severalChosenEntries_data()
+{
+    QTest::addColumn<QString>("button");
+    QTest::addColumn<QStringList>("chosen");
+    QTest::addColumn<QStringList>("standards");
+    QTest::newRow("three standards are fetched and added each")
+        << "addStandardButton" << QStringList{"Red", "Green", "Blue"} << QStringList{"Blue", "Green", "Red"};
+    QTest::newRow("of two libraries only the first chosen is loaded")
+        << "libraryLoadButton" << QStringList{"Library A", "Library B"} << QStringList{"In A"};
+}
+
+void tst_QCJobTemplateDetailWidget::severalChosenEntries()
+{
+    QFETCH(QString, button);
+    QFETCH(QStringList, chosen);
+    QFETCH(QStringList, standards);
+    for (const char* name : {"Red", "Green", "Blue"})
+        save(standardUnder(name, "D65/10"), {});
+    for (const char* name : {"A", "B"}) {
+        auto library = named<ColorStandardsLibrary>(std::string("Library ") + name);
+        library->setStandards({standardUnder(std::string("In ") + name, "D65/10")});
+        save(library->standards()[0], {});
+        save(library, {});
+    }
+    open(named<QCJobTemplate>("T"));
+
+    pickInNextDialog({}, {}, chosen);
+    QTest::mouseClick(m_widget->findChild<QToolButton*>(button), Qt::LeftButton);
+    QTRY_COMPARE_WITH_TIMEOUT(m_modified->count(), standards.size() > 1 ? standards.size() : 1, 5000);
+    QTest::qWait(100); // a fetch for a second library would have answered by now
+    QStringList shown = listTexts(child<QListWidget>("standardsListWidget"));
+    shown.sort();
+    QCOMPARE(shown, standards);
 }
 
 void tst_QCJobTemplateDetailWidget::unexpectedAnswersChangeNothing()
@@ -727,7 +771,7 @@ void tst_QCJobTemplateDetailWidget::vanishedObjectIsReportedNotApplied()
         });
     // The entry is listed, then another program deletes its object before OK.
     const QString path = m_store->path();
-    pickInNextDialog({}, {}, "Fleeting", nullptr, nullptr, [path, id] {
+    pickInNextDialog({}, {}, {"Fleeting"}, nullptr, nullptr, [path, id] {
         RawConnection raw(path);
         raw.exec(QStringLiteral("PRAGMA foreign_keys = OFF"));
         raw.exec(QStringLiteral("DELETE FROM objects WHERE id = ?"), {QString::fromStdString(id)});
