@@ -156,6 +156,8 @@ private slots:
     void propertyPositionIsSharedWithTheLibraryPicker();
     void severalChosenEntries_data();
     void severalChosenEntries();
+    void fetchedObjectsMeetWhatIsThere_data();
+    void fetchedObjectsMeetWhatIsThere();
     void unexpectedAnswersChangeNothing();
     void vanishedObjectIsReportedNotApplied();
 
@@ -730,6 +732,64 @@ void tst_QCJobTemplateDetailWidget::severalChosenEntries()
     QStringList shown = listTexts(child<QListWidget>("standardsListWidget"));
     shown.sort();
     QCOMPARE(shown, standards);
+}
+
+// The template holds the standard "Red" and the property "Plant"; each row
+// brings one fetched object in through its picker's answer slot.
+void tst_QCJobTemplateDetailWidget::fetchedObjectsMeetWhatIsThere_data()
+{
+    QTest::addColumn<QString>("fetched");
+    QTest::addColumn<QStringList>("standards");
+    QTest::addColumn<QStringList>("properties");
+    QTest::addColumn<int>("announced");
+    QTest::newRow("a standard of a name already there is not added, yet announced")
+        << "standard Red" << QStringList{"Red"} << QStringList{"Plant"} << 1;
+    QTest::newRow("a library without standards keeps the template's")
+        << "empty library" << QStringList{"Red"} << QStringList{"Plant"} << 1;
+    QTest::newRow("a library with standards replaces them all")
+        << "library Blue" << QStringList{"Blue"} << QStringList{"Plant"} << 1;
+    QTest::newRow("a property of a name already there changes nothing and says nothing")
+        << "property Plant" << QStringList{"Red"} << QStringList{"Plant"} << 0;
+    QTest::newRow("a property library whose properties are all there is announced once")
+        << "property library Plant" << QStringList{"Red"} << QStringList{"Plant"} << 1;
+    QTest::newRow("a name twice in a property library is added once")
+        << "property library Shift Shift" << QStringList{"Red"} << QStringList{"Plant", "Shift"} << 1;
+}
+
+void tst_QCJobTemplateDetailWidget::fetchedObjectsMeetWhatIsThere()
+{
+    QFETCH(QString, fetched);
+    QFETCH(QStringList, standards);
+    QFETCH(QStringList, properties);
+    QFETCH(int, announced);
+    auto jobTemplate = named<QCJobTemplate>("T");
+    jobTemplate->setStandards({standardUnder("Red", "D65/10")});
+    jobTemplate->setTagDefinitions({definition("Plant")});
+    open(jobTemplate);
+
+    if (fetched == "standard Red") {
+        invoke("onNewStandardLoaded", answer(standardUnder("Red", "D50/2")));
+    } else if (fetched == "empty library" || fetched == "library Blue") {
+        auto library = named<ColorStandardsLibrary>("Library");
+        if (fetched == "library Blue")
+            library->setStandards({standardUnder("Blue", "D65/10")});
+        invoke("onColorLibraryLoaded", answer(library));
+    } else if (fetched == "property Plant") {
+        invoke("onPropertyLoaded", answer(definition("Plant", "Nord")));
+    } else {
+        auto library = named<PropertyLibrary>("Properties");
+        std::vector<std::shared_ptr<TagDefinition>> members;
+        for (const QString& name : fetched.section(' ', 2).split(' '))
+            members.push_back(definition(name.toStdString()));
+        library->setProperties(members);
+        invoke("onPropertyLibraryLoaded", answer(library));
+    }
+
+    QStringList shown = listTexts(child<QListWidget>("standardsListWidget"));
+    shown.sort();
+    QCOMPARE(shown, standards);
+    QCOMPARE(names(jobTemplate->tagDefinitions()), properties);
+    QCOMPARE(m_modified->count(), announced);
 }
 
 void tst_QCJobTemplateDetailWidget::unexpectedAnswersChangeNothing()
