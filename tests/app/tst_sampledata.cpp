@@ -631,9 +631,7 @@ void tst_SampleData::failureHalfWayLeavesStoreEmpty()
     TempStore store;
     QString message;
     if (failure == "read-only") {
-        StoreOptions readOnly;
-        readOnly.readOnly = true;
-        store.reopen(readOnly);
+        store.reopenReadOnly();
         message = SampleData::seedIfEmpty(store.model());
     } else {
         const auto set = sampleSet();

@@ -25,6 +25,13 @@ void TempStore::reopen(vemi::StoreOptions options)
         std::fprintf(stderr, "TempStore: %s\n", qPrintable(error));
 }
 
+void TempStore::reopenReadOnly()
+{
+    vemi::StoreOptions readOnly;
+    readOnly.readOnly = true;
+    reopen(readOnly);
+}
+
 TempStore::Answer TempStore::run(std::shared_ptr<vemi::Command> command, const std::string& dispatcherId)
 {
     return vemi::CommandSender::sendAndWait(*m_model, dispatcherId, std::move(command), 20000);

@@ -29,6 +29,8 @@ public:
     vemi::MarloModel& model() { return *m_model; }
     // Closes the store (its worker finishes first) and opens the same file anew.
     void reopen(vemi::StoreOptions options = {});
+    // The same, opened read-only as with the shell's --read-only.
+    void reopenReadOnly();
 
     // Waits at most 20 s; dispatcherId "" is the default store.
     Answer run(std::shared_ptr<vemi::Command> command, const std::string& dispatcherId = std::string());

@@ -550,9 +550,7 @@ void tst_DirEntryBrowser::refusedRenameKeepsTheStoredName()
 {
     TempStore store;
     storeTemplate(store, "Door Panel", "");
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
+    store.reopenReadOnly();
     Browser browser(store);
     QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     Node* node = browser.find(QStringLiteral("Door Panel"));
@@ -865,9 +863,7 @@ void tst_DirEntryBrowser::readOnlyStoreDisablesEditing()
     storeTemplate(store, "Door Panel", "");
     QFile::Permissions permissions = QFile::permissions(store.folder());
     if (how == QLatin1String("read-only option")) {
-        StoreOptions readOnly;
-        readOnly.readOnly = true;
-        store.reopen(readOnly);
+        store.reopenReadOnly();
     } else if (how == QLatin1String("folder not writable")) {
         QVERIFY(QFile::setPermissions(store.folder(), QFile::ReadOwner | QFile::ExeOwner));
         if (QFileInfo(store.folder()).isWritable()) {
@@ -1004,9 +1000,7 @@ void tst_DirEntryBrowser::readOnlyStoreOffersNoSaveAtClose()
 {
     TempStore store;
     storeTemplate(store, "Door Panel", "");
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
+    store.reopenReadOnly();
     Browser browser(store);
     QVERIFY(browser.openLoaded(QStringLiteral("Door Panel")));
     browser.widget.namedObjectWasModified(browser.find(QStringLiteral("Door Panel"))->object());

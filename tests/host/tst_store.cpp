@@ -408,9 +408,7 @@ void tst_Store::readOnlyStoreRefusesWrites()
     TempStore store;
     auto jobTemplate = makeTemplate("Kept");
     QVERIFY(store.save(jobTemplate));
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
+    store.reopenReadOnly();
 
     jobTemplate->setName("Changed");
     auto update = std::make_shared<UpdateObject>();

@@ -178,9 +178,7 @@ void tst_SchematicImages::clearEmptiesDataAndSavesAtOnce()
 void tst_SchematicImages::failedSaveOfClearedPictureIsReported()
 {
     TempStore store;
-    StoreOptions readOnly;
-    readOnly.readOnly = true;
-    store.reopen(readOnly);
+    store.reopenReadOnly();
     QCJobTemplateModel model(store.model());
     model.setJobTemplate(m_template);
     QSignalSpy failed(&model, &QCJobTemplateModel::sgTemplateSaveFailed);

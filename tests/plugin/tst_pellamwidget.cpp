@@ -62,6 +62,8 @@ private slots:
 private:
     PellamWidget* createWidget();
     void select(const std::vector<Node*>& nodes);
+    // Stores "Door Panel", starts the tab anew and opens it through its browser.
+    Node* openStoredTemplate();
     QStackedWidget* pages() const { return m_widget->findChild<QStackedWidget*>(); }
     // The editor's group box whose title names the open template.
     QGroupBox* editorHeading() const
@@ -267,20 +269,31 @@ void tst_PellamWidget::longTemplateNameKeepsTheWindowNarrow()
              QString::fromStdString(opened->name()));
 }
 
-void tst_PellamWidget::editorModificationReachesBrowser()
+Node* tst_PellamWidget::openStoredTemplate()
 {
     auto jobTemplate = std::make_shared<QCJobTemplate>();
     jobTemplate->setName("Door Panel");
     const std::string topLevel;
-    QVERIFY(m_store->save(jobTemplate, &topLevel));
+    if (!m_store->save(jobTemplate, &topLevel))
+        return nullptr;
     delete m_widget;
     m_widget = createWidget();
     auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
-    QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
+    if (!QTest::qWaitFor([browser] { return browser->treeModel()->rowCount() == 1; }, 5000))
+        return nullptr;
     Node* node = browser->treeModel()->root()->children().front().get();
     browser->treeView()->selectionModel()->setCurrentIndex(browser->treeModel()->indexFromNode(node),
                                                            QItemSelectionModel::ClearAndSelect);
-    QTRY_COMPARE(pages()->currentIndex(), 1);
+    if (!QTest::qWaitFor([this] { return pages()->currentIndex() == 1; }, 5000))
+        return nullptr;
+    return node;
+}
+
+void tst_PellamWidget::editorModificationReachesBrowser()
+{
+    Node* node = openStoredTemplate();
+    QVERIFY(node);
+    auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
     QVERIFY(!node->isModified());
 
     auto open = std::dynamic_pointer_cast<QCJobTemplate>(node->object());
@@ -291,18 +304,9 @@ void tst_PellamWidget::editorModificationReachesBrowser()
 
 void tst_PellamWidget::renameInBrowserRetitlesTheEditor()
 {
-    auto jobTemplate = std::make_shared<QCJobTemplate>();
-    jobTemplate->setName("Door Panel");
-    const std::string topLevel;
-    QVERIFY(m_store->save(jobTemplate, &topLevel));
-    delete m_widget;
-    m_widget = createWidget();
+    Node* node = openStoredTemplate();
+    QVERIFY(node);
     auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
-    QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
-    Node* node = browser->treeModel()->root()->children().front().get();
-    browser->treeView()->selectionModel()->setCurrentIndex(browser->treeModel()->indexFromNode(node),
-                                                           QItemSelectionModel::ClearAndSelect);
-    QTRY_COMPARE(pages()->currentIndex(), 1);
     auto* group = m_widget->findChild<QGroupBox*>(QStringLiteral("checkZoneGroupBox"));
     QTRY_COMPARE(group->title(), QStringLiteral("Checkpoints for: Door Panel"));
 
