@@ -140,16 +140,10 @@ private slots:
     void templatesAreComplete();
     void librariesResolveTheirMembers_data();
     void librariesResolveTheirMembers();
-    void chartPatchesKeepPublishedLab_data();
-    void chartPatchesKeepPublishedLab();
     void displayColoursFollowLab_data();
     void displayColoursFollowLab();
-    void toleranceSetsCarryFormulaAndCondition_data();
-    void toleranceSetsCarryFormulaAndCondition();
     void conditionsOfStandardAndTolerance_data();
     void conditionsOfStandardAndTolerance();
-    void definitionsWithAndWithoutDefaults_data();
-    void definitionsWithAndWithoutDefaults();
     void secondRunAddsNothing();
     void storeWithAnythingIsLeftAlone_data();
     void storeWithAnythingIsLeftAlone();
@@ -338,37 +332,6 @@ void tst_SampleData::librariesResolveTheirMembers()
     QCOMPARE(names, members);
 }
 
-void tst_SampleData::chartPatchesKeepPublishedLab_data()
-{
-    QTest::addColumn<QString>("name");
-    QTest::addColumn<double>("L");
-    QTest::addColumn<double>("a");
-    QTest::addColumn<double>("b");
-    QTest::newRow("first patch") << "Dark Skin" << 37.54 << 14.37 << 14.92;
-    QTest::newRow("saturated blue") << "Blue" << 28.37 << 15.42 << -49.80;
-    QTest::newRow("cyan, both axes negative") << "Cyan" << 49.57 << -29.71 << -28.32;
-    QTest::newRow("white of the grey scale") << "White 9.5" << 95.19 << -1.03 << 2.93;
-    QTest::newRow("last patch") << "Black 2" << 20.64 << 0.07 << -0.46;
-}
-
-void tst_SampleData::chartPatchesKeepPublishedLab()
-{
-    QFETCH(QString, name);
-    QFETCH(double, L);
-    QFETCH(double, a);
-    QFETCH(double, b);
-
-    const auto standard = fetchNamed<Standard>(*m_seeded, name);
-    QVERIFY(standard);
-    const auto lab = firstLab(*standard);
-    QVERIFY(lab);
-    // Exact: the published values are stored as they are, not rounded or converted.
-    QCOMPARE(lab->L(), L);
-    QCOMPARE(lab->a(), a);
-    QCOMPARE(lab->b(), b);
-    QCOMPARE(lab->colorimetricCondition(), std::string("D50/2"));
-}
-
 void tst_SampleData::displayColoursFollowLab_data()
 {
     // Expected values worked out by hand: the Lab values taken relative to their white
@@ -412,37 +375,6 @@ void tst_SampleData::displayColoursFollowLab()
     QVERIFY2(qAbs(actual.red() - expected.red()) <= tolerance && qAbs(actual.green() - expected.green()) <= tolerance
                  && qAbs(actual.blue() - expected.blue()) <= tolerance,
              qPrintable(QStringLiteral("%1 shows as %2").arg(name, actual.name())));
-}
-
-void tst_SampleData::toleranceSetsCarryFormulaAndCondition_data()
-{
-    QTest::addColumn<QString>("set");
-    QTest::addColumn<QString>("method");
-    QTest::addColumn<double>("limit");
-    QTest::addColumn<QString>("condition");
-    QTest::newRow("interior parts, dE2000") << "Automotive Interior" << "dE2000" << 1.0 << "D65/10";
-    QTest::newRow("fabrics, CMC 2:1") << "Seat Fabric CMC" << "dECMC(2:1)" << 1.2 << "D65/10";
-    QTest::newRow("chart, dE2000 under D50") << "Chart Check" << "dE2000" << 1.5 << "D50/2";
-    QTest::newRow("labels, dE*ab") << "Printed Labels" << "dE*ab" << 3.0 << "D50/2";
-}
-
-void tst_SampleData::toleranceSetsCarryFormulaAndCondition()
-{
-    QFETCH(QString, set);
-    QFETCH(QString, method);
-    QFETCH(double, limit);
-    QFETCH(QString, condition);
-
-    const auto tolerances = fetchNamed<ToleranceSet>(*m_seeded, set);
-    QVERIFY(tolerances);
-    QCOMPARE(int(tolerances->tolerances().size()), 1);
-    // The editor's condition check looks at a Lab tolerance only; any other kind passes unchecked.
-    const auto tolerance = firstLabTolerance(*tolerances);
-    QVERIFY(tolerance);
-    QCOMPARE(QString::fromStdString(tolerance->method()), method);
-    QCOMPARE(tolerance->limit(), limit);
-    QVERIFY(tolerance->colorimetricCondition());
-    QCOMPARE(QString::fromStdString(tolerance->colorimetricCondition()->toString()), condition);
 }
 
 // The pairs a user tries in the editor: a template's standards and a tolerance
@@ -500,34 +432,6 @@ void tst_SampleData::conditionsOfStandardAndTolerance()
                                      QString::fromStdString(lab->colorimetricCondition()),
                                      QString::fromStdString(toleranceCondition))));
     }
-}
-
-void tst_SampleData::definitionsWithAndWithoutDefaults_data()
-{
-    QTest::addColumn<QString>("definition");
-    QTest::addColumn<QString>("defaultValue");
-    QTest::addColumn<bool>("choice");
-    QTest::newRow("free text without default") << "Supplier" << QString() << false;
-    QTest::newRow("another free text without default") << "Inspector" << QString() << false;
-    QTest::newRow("free text with default") << "Parts per Lot" << "3" << false;
-    QTest::newRow("choice defaulting to its first value") << "Material" << "PP-T20" << true;
-    QTest::newRow("shift choice") << "Shift" << "Early" << true;
-    QTest::newRow("light booth choice") << "Light Booth" << "D65" << true;
-}
-
-void tst_SampleData::definitionsWithAndWithoutDefaults()
-{
-    QFETCH(QString, definition);
-    QFETCH(QString, defaultValue);
-    QFETCH(bool, choice);
-
-    const auto stored = fetchNamed<TagDefinition>(*m_seeded, definition);
-    QVERIFY(stored);
-    QCOMPARE(QString::fromStdString(stored->defaultValue()), defaultValue);
-    const auto allowed = stored->allowedValues();
-    QCOMPARE(!allowed.empty(), choice);
-    if (choice)
-        QVERIFY(std::find(allowed.begin(), allowed.end(), defaultValue.toStdString()) != allowed.end());
 }
 
 void tst_SampleData::secondRunAddsNothing()

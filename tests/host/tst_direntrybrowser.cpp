@@ -172,7 +172,6 @@ private slots:
     void editedObjectSurvivesDeletionElsewhere_data();
     void editedObjectSurvivesDeletionElsewhere();
     void renameThenSaveKeepsTheNewName();
-    void renamedNewTemplateSurvivesRefreshAndSave();
     void damagedObjectIsLeftOutOfTheSelection();
     void deleteQuestionSaysWhatGoes_data();
     void deleteQuestionSaysWhatGoes();
@@ -639,31 +638,6 @@ void tst_DirEntryBrowser::renameThenSaveKeepsTheNewName()
     const auto stored = store.fetch(QCJobTemplate::typeId(), node->object()->id());
     QVERIFY(stored);
     QCOMPARE(stored->header()->name(), std::string("Door Trim"));
-}
-
-void tst_DirEntryBrowser::renamedNewTemplateSurvivesRefreshAndSave()
-{
-    TempStore store;
-    storeTemplate(store, "Door Panel", "");
-    Browser browser(store);
-    QTRY_VERIFY(browser.find(QStringLiteral("Door Panel")));
-    browser.widget.actionNew()->trigger();
-    Node* created = browser.find(QStringLiteral("Job Template"));
-    QVERIFY(created);
-    browser.model.renameNode(created, "Bumper Left", {});
-
-    browser.widget.refresh();
-    QTRY_VERIFY(browser.find(QStringLiteral("Bumper Left")));
-    QVERIFY(!browser.find(QStringLiteral("Job Template")));
-    Node* renamed = browser.find(QStringLiteral("Bumper Left"));
-    QVERIFY(renamed->isModified());
-    browser.select(renamed);
-    browser.widget.actionSave()->trigger();
-    QTRY_VERIFY(!browser.find(QStringLiteral("Bumper Left"))->isModified());
-
-    store.reopen();
-    Browser restarted(store);
-    QTRY_COMPARE(restarted.namesIn(nullptr), (QStringList{"Bumper Left", "Door Panel"}));
 }
 
 void tst_DirEntryBrowser::damagedObjectIsLeftOutOfTheSelection()

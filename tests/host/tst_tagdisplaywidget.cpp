@@ -47,7 +47,6 @@ private slots:
     void ctrlClickAddsRowsInRowOrder();
     void clickBelowTheRowsReportsNoRow();
     void doubleClickReportsRowAndName();
-    void clearSelectionsLeavesNoRowSelected();
     void setTagsReplacesEveryRow();
 
 private:
@@ -188,20 +187,6 @@ void tst_TagDisplayWidget::doubleClickReportsRowAndName()
     QCOMPARE(doubleClicked.count(), 1);
     QCOMPARE(doubleClicked.first().at(0).toInt(), 3);
     QCOMPARE(doubleClicked.first().at(1).value<std::string>(), std::string("Größe"));
-}
-
-void tst_TagDisplayWidget::clearSelectionsLeavesNoRowSelected()
-{
-    clickRow(1);
-    clickRow(2, Qt::ShiftModifier);
-    QCOMPARE(m_widget->getSelectedRows(), (std::vector<int>{1, 2}));
-    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
-
-    m_widget->clearSelections();
-
-    QVERIFY(m_widget->getSelectedRows().empty());
-    QCOMPARE(selected.count(), 1);
-    QVERIFY(selected.last().at(0).toInt() < 0);
 }
 
 void tst_TagDisplayWidget::setTagsReplacesEveryRow()
