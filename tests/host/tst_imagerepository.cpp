@@ -46,8 +46,6 @@ void tst_ImageRepository::everyTypeHasAnIcon()
     QFETCH(int, brightness);
 
     const QIcon icon = ImageRepository::instance().iconForType(typeId.toStdString(), brightness);
-    QVERIFY(!icon.isNull());
-    QVERIFY(!icon.availableSizes().isEmpty());
     const QImage image = imageOf(icon);
     // A drawing, not a transparent square: some pixel is opaque.
     bool anyOpaque = false;

@@ -35,6 +35,48 @@ std::vector<std::string> toPath(const QStringList& names)
     return path;
 }
 
+QTreeView* tree(QDialog& dialog)
+{
+    return dialog.findChild<QTreeView*>(QStringLiteral("folderTree"));
+}
+
+QModelIndex indexOf(QTreeView* view, const QStringList& names)
+{
+    const QAbstractItemModel* model = view->model();
+    QModelIndex found;
+    for (const QString& name : names) {
+        const QModelIndex parent = found;
+        found = {};
+        for (int row = 0; model && row < model->rowCount(parent) && !found.isValid(); ++row) {
+            if (model->index(row, 0, parent).data().toString() == name)
+                found = model->index(row, 0, parent);
+        }
+        if (!found.isValid())
+            return {};
+    }
+    return found;
+}
+
+void ctrlClick(QTreeView* view, const QModelIndex& index)
+{
+    view->scrollTo(index);
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ControlModifier, view->visualRect(index).center());
+}
+
+// A view acts on a double click only where the press before it landed.
+void doubleClick(QTreeView* view, const QModelIndex& index)
+{
+    view->scrollTo(index);
+    const QPoint at = view->visualRect(index).center();
+    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, at);
+    QTest::mouseDClick(view->viewport(), Qt::LeftButton, {}, at);
+}
+
+QPushButton* okButton(QDialog& dialog)
+{
+    return dialog.findChild<QDialogButtonBox*>(QStringLiteral("buttonBox"))->button(QDialogButtonBox::Ok);
+}
+
 } // namespace
 
 // Two real store files in one model. The default store ("Local") holds the
@@ -58,13 +100,7 @@ private slots:
 private:
     std::string createFolder(const std::string& dispatcherId, const std::string& parentId, const std::string& name);
     std::string saveStandard(const std::string& dispatcherId, const std::string& folderId, const std::string& name);
-    std::unique_ptr<ObjectBrowserDialog> makeDialog(std::shared_ptr<SelectedPath> path);
-    static QTreeView* tree(QDialog& dialog);
-    static QModelIndex indexOf(QTreeView* view, const QStringList& names);
-    static void chooseStore(QDialog& dialog, const QString& text);
-    static void ctrlClick(QTreeView* view, const QModelIndex& index);
-    static void doubleClick(QTreeView* view, const QModelIndex& index);
-    static QPushButton* okButton(QDialog& dialog);
+    std::unique_ptr<ObjectBrowserDialog> makeDialog(std::shared_ptr<SelectedPath> path, bool show = true);
 
     std::unique_ptr<TempStore> m_store;
     std::map<std::string, std::string> m_ids; // object ids by standard name
@@ -113,64 +149,16 @@ std::string tst_ObjectBrowserDialog::saveStandard(const std::string& dispatcherI
     return standard->id();
 }
 
-// Set up as the template editor's pickers do, then shown; waits until the
-// first store's tree is read.
-std::unique_ptr<ObjectBrowserDialog> tst_ObjectBrowserDialog::makeDialog(std::shared_ptr<SelectedPath> path)
+// Set up as the template editor's pickers do, then shown unless run modal.
+std::unique_ptr<ObjectBrowserDialog> tst_ObjectBrowserDialog::makeDialog(std::shared_ptr<SelectedPath> path, bool show)
 {
     auto dialog = std::make_unique<ObjectBrowserDialog>(m_store->model(), nullptr);
     dialog->initialize(true, false, {Standard::typeId()}, QStringLiteral("Add selected standard(s)"), false);
     dialog->setDispatcherList({"", kSecondStore, kMissingStore});
     dialog->setLastSelectedPath(std::move(path));
-    dialog->show();
+    if (show)
+        dialog->show();
     return dialog;
-}
-
-QTreeView* tst_ObjectBrowserDialog::tree(QDialog& dialog)
-{
-    return dialog.findChild<QTreeView*>(QStringLiteral("folderTree"));
-}
-
-QModelIndex tst_ObjectBrowserDialog::indexOf(QTreeView* view, const QStringList& names)
-{
-    const QAbstractItemModel* model = view->model();
-    QModelIndex found;
-    for (const QString& name : names) {
-        const QModelIndex parent = found;
-        found = {};
-        for (int row = 0; model && row < model->rowCount(parent) && !found.isValid(); ++row) {
-            if (model->index(row, 0, parent).data().toString() == name)
-                found = model->index(row, 0, parent);
-        }
-        if (!found.isValid())
-            return {};
-    }
-    return found;
-}
-
-void tst_ObjectBrowserDialog::chooseStore(QDialog& dialog, const QString& text)
-{
-    auto* combo = dialog.findChild<QComboBox*>(QStringLiteral("dispatcherCombo"));
-    combo->setCurrentIndex(combo->findText(text));
-}
-
-void tst_ObjectBrowserDialog::ctrlClick(QTreeView* view, const QModelIndex& index)
-{
-    view->scrollTo(index);
-    QTest::mouseClick(view->viewport(), Qt::LeftButton, Qt::ControlModifier, view->visualRect(index).center());
-}
-
-// A view acts on a double click only where the press before it landed.
-void tst_ObjectBrowserDialog::doubleClick(QTreeView* view, const QModelIndex& index)
-{
-    view->scrollTo(index);
-    const QPoint at = view->visualRect(index).center();
-    QTest::mouseClick(view->viewport(), Qt::LeftButton, {}, at);
-    QTest::mouseDClick(view->viewport(), Qt::LeftButton, {}, at);
-}
-
-QPushButton* tst_ObjectBrowserDialog::okButton(QDialog& dialog)
-{
-    return dialog.findChild<QDialogButtonBox*>(QStringLiteral("buttonBox"))->button(QDialogButtonBox::Ok);
 }
 
 void tst_ObjectBrowserDialog::picksEntriesOfTheChosenStore()
@@ -179,7 +167,8 @@ void tst_ObjectBrowserDialog::picksEntriesOfTheChosenStore()
     QTreeView* view = tree(*dialog);
     QTRY_VERIFY(indexOf(view, {"Local Beige"}).isValid());
 
-    chooseStore(*dialog, kSecondStore);
+    auto* stores = dialog->findChild<QComboBox*>(QStringLiteral("dispatcherCombo"));
+    stores->setCurrentIndex(stores->findText(kSecondStore));
     QTRY_VERIFY(indexOf(view, {"Old"}).isValid());
     QVERIFY(!indexOf(view, {"Local Beige"}).isValid());
     const QModelIndex charts = indexOf(view, {"Charts"});
@@ -299,10 +288,7 @@ void tst_ObjectBrowserDialog::storeWithoutFileCannotBeChosen()
 
 void tst_ObjectBrowserDialog::modalDoubleClickAccepts()
 {
-    ObjectBrowserDialog dialog(m_store->model(), nullptr);
-    dialog.initialize(true, false, {Standard::typeId()}, QStringLiteral("Add selected standard(s)"), false);
-    dialog.setDispatcherList({"", kSecondStore});
-    dialog.setLastSelectedPath(std::make_shared<SelectedPath>(kSecondStore, toPath({"Charts", "Deep/er"})));
+    auto dialog = makeDialog(std::make_shared<SelectedPath>(kSecondStore, toPath({"Charts", "Deep/er"})), false);
 
     ModalAnswer::actOnNextModal([](QWidget* modal) {
         QTreeView* view = modal->findChild<QTreeView*>(QStringLiteral("folderTree"));
@@ -311,13 +297,13 @@ void tst_ObjectBrowserDialog::modalDoubleClickAccepts()
         QTRY_VERIFY(view->isExpanded(deep.parent()));
         doubleClick(view, deep);
     });
-    QCOMPARE(dialog.exec(), int(QDialog::Accepted));
+    QCOMPARE(dialog->exec(), int(QDialog::Accepted));
 
-    const auto entries = dialog.selectedDirEntries();
+    const auto entries = dialog->selectedDirEntries();
     QCOMPARE(entries.size(), 1);
     QCOMPARE(entries[0]->header()->name(), std::string("Remote Deep"));
     QCOMPARE(entries[0]->dispatcherId(), std::string(kSecondStore));
-    QCOMPARE(dialog.lastSelectedPath()->path(), toPath({"Charts", "Deep/er"}));
+    QCOMPARE(dialog->lastSelectedPath()->path(), toPath({"Charts", "Deep/er"}));
 }
 
 QC_TEST_MAIN(tst_ObjectBrowserDialog)

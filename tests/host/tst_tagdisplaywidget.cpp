@@ -43,9 +43,8 @@ private slots:
     void cleanup();
     void showsOneRowPerDefinition_data();
     void showsOneRowPerDefinition();
-    void clickSelectsRowAndReportsIt();
-    void ctrlClickAddsRowsInRowOrder();
-    void clickBelowTheRowsReportsNoRow();
+    void clicksSelectAndReport_data();
+    void clicksSelectAndReport();
     void doubleClickReportsRowAndName();
     void setTagsReplacesEveryRow();
 
@@ -135,47 +134,42 @@ void tst_TagDisplayWidget::showsOneRowPerDefinition()
     QCOMPARE(shown, expected);
 }
 
-void tst_TagDisplayWidget::clickSelectsRowAndReportsIt()
+void tst_TagDisplayWidget::clicksSelectAndReport_data()
 {
-    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+    QTest::addColumn<QStringList>("clicks"); // row numbers, "^" for a Ctrl-click, "below" under the last row
+    QTest::addColumn<QList<int>>("selected");
+    QTest::addColumn<int>("reportedRow");     // of the last report; -1: none
+    QTest::addColumn<QStringList>("reportedNames");
 
-    clickRow(2);
-
-    QCOMPARE(m_widget->getSelectedRows(), std::vector<int>{2});
-    QVERIFY(!selected.isEmpty());
-    QCOMPARE(selected.last().at(0).toInt(), 2);
-    QCOMPARE(selected.last().at(1).toStringList(), QStringList{"Material"});
+    QTest::newRow("click selects the row") << QStringList{"2"} << QList<int>{2} << 2 << QStringList{"Material"};
+    QTest::newRow("ctrl-click adds rows, reported in row order")
+        << QStringList{"3", "^0"} << QList<int>{0, 3} << 0 << QStringList{"Supplier", "Größe"};
+    QTest::newRow("ctrl-click on a selected row takes it out")
+        << QStringList{"3", "^0", "^3"} << QList<int>{0} << 0 << QStringList{"Supplier"};
+    QTest::newRow("click below the rows reports no row") << QStringList{"1", "below"} << QList<int>{} << -1
+                                                         << QStringList{};
 }
 
-void tst_TagDisplayWidget::ctrlClickAddsRowsInRowOrder()
+void tst_TagDisplayWidget::clicksSelectAndReport()
 {
-    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
+    QFETCH(QStringList, clicks);
+    QFETCH(QList<int>, selected);
+    QFETCH(int, reportedRow);
+    QFETCH(QStringList, reportedNames);
+    QSignalSpy reported(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
 
-    clickRow(3);
-    clickRow(0, Qt::ControlModifier);
+    for (const QString& click : clicks) {
+        if (click == "below")
+            QTest::mouseClick(table()->viewport(), Qt::LeftButton, Qt::NoModifier,
+                              QPoint(10, table()->visualItemRect(table()->item(3, 0)).bottom() + 20));
+        else
+            clickRow(click.right(1).toInt(), click.startsWith('^') ? Qt::ControlModifier : Qt::NoModifier);
+    }
 
-    QCOMPARE(m_widget->getSelectedRows(), (std::vector<int>{0, 3}));
-    QCOMPARE(selected.last().at(0).toInt(), 0);
-    QCOMPARE(selected.last().at(1).toStringList(), (QStringList{"Supplier", "Größe"}));
-
-    // Ctrl-clicking a selected row takes it out again.
-    clickRow(3, Qt::ControlModifier);
-    QCOMPARE(m_widget->getSelectedRows(), std::vector<int>{0});
-}
-
-void tst_TagDisplayWidget::clickBelowTheRowsReportsNoRow()
-{
-    clickRow(1);
-    QSignalSpy selected(m_widget.get(), &TagDisplayWidget::tagRowsSelected);
-    const QPoint belowLastRow(10, table()->visualItemRect(table()->item(3, 0)).bottom() + 20);
-    QVERIFY(!table()->indexAt(belowLastRow).isValid());
-
-    QTest::mouseClick(table()->viewport(), Qt::LeftButton, Qt::NoModifier, belowLastRow);
-
-    QVERIFY(m_widget->getSelectedRows().empty());
-    QCOMPARE(selected.count(), 1);
-    QVERIFY(selected.last().at(0).toInt() < 0);
-    QVERIFY(selected.last().at(1).toStringList().isEmpty());
+    QCOMPARE(m_widget->getSelectedRows(), std::vector<int>(selected.begin(), selected.end()));
+    QVERIFY(!reported.isEmpty());
+    QCOMPARE(qMax(reported.last().at(0).toInt(), -1), reportedRow);
+    QCOMPARE(reported.last().at(1).toStringList(), reportedNames);
 }
 
 void tst_TagDisplayWidget::doubleClickReportsRowAndName()

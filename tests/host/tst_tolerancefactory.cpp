@@ -36,7 +36,6 @@ private slots:
     void buildsConditionsOfLabTolerances_data();
     void buildsConditionsOfLabTolerances();
     void leavesTheStoredSetAlone();
-    void emptyHandleGivesEmptyHandle();
 };
 
 void tst_ToleranceFactory::initTestCase()
@@ -103,10 +102,6 @@ void tst_ToleranceFactory::leavesTheStoredSetAlone()
     QVERIFY(built->tolerances().front() != lab);
     QVERIFY(!lab->colorimetricCondition());
     QCOMPARE(set->tolerances().size(), size_t(1));
-}
-
-void tst_ToleranceFactory::emptyHandleGivesEmptyHandle()
-{
     QVERIFY(!ToleranceFactory::toleranceFactory()->buildToleranceSet(nullptr));
 }
 
