@@ -1,6 +1,8 @@
 #include "detail/QCJobTemplateDetailWidget.h"
 #include "ui_QCJobTemplateDetailWidget.h"
 
+#include "checkpoints/CheckZoneEditor.h"
+
 #include "host/client/GeneralSettings.h"
 #include "host/client/ToleranceFactory.h"
 #include "host/domain/AppearanceValues.h"
@@ -107,10 +109,16 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
             SLOT(onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>)));
     connect(m_model.get(), &QCJobTemplateModel::sgSetTemplateSavable, this,
             &QCJobTemplateDetailWidget::onTemplateSavable);
+    connect(m_ui->checkZoneEditor, &CheckZoneEditor::sgSetTemplateSavable, this,
+            &QCJobTemplateDetailWidget::onTemplateSavable);
+    connect(m_ui->checkZoneEditor, &CheckZoneEditor::sgGrabRubberBandedArea, this,
+            &QCJobTemplateDetailWidget::onGrabRubberBandedImageArea);
     connect(m_ui->tagDisplayWidget, SIGNAL(tagRowsSelected(int, QStringList)), this,
             SLOT(tagRowsSelected(int, QStringList)));
     connect(m_ui->tagDisplayWidget, SIGNAL(tagRowDoubleClicked(int, std::string)), this,
             SLOT(tagEditSelected(int, std::string)));
+
+    m_ui->checkZoneEditor->init(m_store, m_model);
 
     m_tolerancePath = loadSelectedPath(PellamKeys::TolerancePathGroup);
     m_libraryPath = loadSelectedPath(PellamKeys::LibraryPathGroup);

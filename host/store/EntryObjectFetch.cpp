@@ -28,6 +28,10 @@ void EntryObjectFetch::fetch(const MarloModel& store, const DirEntry& entry, con
         [onObject, onError, description](const std::shared_ptr<Response>& response) {
             const auto answer = std::dynamic_pointer_cast<GetMarloObjectResponse>(response);
             if (answer && answer->object()) {
+                // Members of a library that could not be read are left out of
+                // it; the log says which, so that a shorter library is explained.
+                for (const QString& problem : answer->problems())
+                    qWarning("%s", qPrintable(problem));
                 if (onObject)
                     onObject(answer->object());
             } else if (onError) {

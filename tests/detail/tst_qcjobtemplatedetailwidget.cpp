@@ -31,10 +31,12 @@
 #include <QCheckBox>
 #include <QComboBox>
 #include <QDialogButtonBox>
+#include <QFile>
 #include <QGroupBox>
 #include <QLabel>
 #include <QLineEdit>
 #include <QListWidget>
+#include <QMetaMethod>
 #include <QPushButton>
 #include <QSplitter>
 #include <QTabWidget>
@@ -132,6 +134,9 @@ private slots:
     void init();
     void cleanup();
 
+    void signalAndSlotsInOrder();
+    void buttonsAtConstruction_data();
+    void buttonsAtConstruction();
     void reloadLeavesNothingOfThePreviousTemplate();
     void editsAreAnnouncedOnce();
     void splitterStatesSurviveARestart();
@@ -198,6 +203,78 @@ void tst_QCJobTemplateDetailWidget::cleanup()
     m_widget.reset();
     m_model.reset();
     m_store.reset();
+}
+
+// Callers connect by signature and the host lists the editor's methods in
+// this order; a renamed or moved slot breaks them silently.
+void tst_QCJobTemplateDetailWidget::signalAndSlotsInOrder()
+{
+    const QStringList expected = {
+        "sgJobTemplateWasModified", "on_browseSchematicButton_clicked", "on_cropSchematicButton_clicked",
+        "on_fitToWindowButton_clicked", "on_resetZoomButton_clicked", "on_clearSchematicButton_clicked",
+        "onSavedMc", "onSaveError", "onSaveProgress", "onColorLibraryLoaded", "onPropertyLibraryLoaded",
+        "onNewStandardLoaded", "onNewToleranceLoaded", "onGrabRubberBandedImageArea",
+        "on_addMeasurementConfigurationButton_clicked", "on_zoomInButton_clicked", "on_zoomOutButton_clicked",
+        "on_addProperty_clicked", "on_libraryLoadButton_clicked", "on_addStandardButton_clicked",
+        "on_clearAllStandards_clicked", "on_removeTag_clicked", "on_insertToleranceButton_clicked",
+        "on_removeToleranceButton_clicked", "on_enableRepeatCheckBox_clicked", "on_descriptionEdit_textEdited",
+        "on_addPropertyLibrary_clicked", "onInstrumentConnected", "onInstrumentDisconnected", "tagEditSelected",
+        "tagRowsSelected", "onPreferredInstrumentChanged", "onPropertyLoaded"};
+    const QMetaObject& meta = QCJobTemplateDetailWidget::staticMetaObject;
+    QStringList names;
+    int protectedFrom = -1;
+    for (int i = meta.methodOffset(); i < meta.methodCount(); ++i) {
+        names << QString::fromLatin1(meta.method(i).name());
+        if (protectedFrom < 0 && meta.method(i).access() == QMetaMethod::Protected)
+            protectedFrom = i - meta.methodOffset();
+    }
+    QCOMPARE(names, expected);
+    QCOMPARE(protectedFrom, expected.indexOf("onInstrumentConnected"));
+    QCOMPARE(meta.method(meta.methodOffset()).methodType(), QMetaMethod::Signal);
+}
+
+void tst_QCJobTemplateDetailWidget::buttonsAtConstruction_data()
+{
+    QTest::addColumn<QString>("button");
+    QTest::addColumn<QString>("icon");
+    QTest::addColumn<QString>("toolTip");
+    QTest::addColumn<bool>("enabled");
+    QTest::newRow("addProperty") << "addProperty" << ":/Images/Images/Icon-Tag-BL.png" << "Add Properties" << false;
+    QTest::newRow("addPropertyLibrary") << "addPropertyLibrary" << ":/Images/Images/Icon-Librar-BL.png"
+                                        << "Add Properties from Library" << false;
+    QTest::newRow("removeTag") << "removeTag" << ":/Images/Images/Icon-Trash-BL.png" << "Remove Selected Property"
+                               << false;
+    QTest::newRow("addStandardButton") << "addStandardButton" << ":/Images/Images/Icon-Standard-BL.png"
+                                       << "Add Standard(s)" << false;
+    QTest::newRow("libraryLoadButton") << "libraryLoadButton" << ":/Images/Images/Icon-Librar-BL.png"
+                                       << "Insert Standards Library" << false;
+    QTest::newRow("clearAllStandards") << "clearAllStandards" << ":/Images/Images/Icon-Trash-BL.png"
+                                       << "Remove All Standards" << false;
+    QTest::newRow("addMeasurementConfigurationButton")
+        << "addMeasurementConfigurationButton" << ":/Images/Images/Icon-OptionsGear-BL.png"
+        << "Set Measurement Configuration" << false;
+    QTest::newRow("insertToleranceButton") << "insertToleranceButton" << ":/Images/Icon-Add-BL.png"
+                                           << "Insert a default Tolerance" << true;
+    QTest::newRow("removeToleranceButton") << "removeToleranceButton" << ":/Images/Images/Icon-Trash-BL.png"
+                                           << "Remove all Tolerances" << true;
+}
+
+// Each button shows its picture (a missing resource leaves an empty button)
+// and is usable only once a template is shown.
+void tst_QCJobTemplateDetailWidget::buttonsAtConstruction()
+{
+    QFETCH(QString, button);
+    QFETCH(QString, icon);
+    QFETCH(QString, toolTip);
+    QFETCH(bool, enabled);
+    auto* widget = m_widget->findChild<QAbstractButton*>(button);
+    QVERIFY(widget);
+    QVERIFY(QFile::exists(icon));
+    QVERIFY(!widget->icon().isNull());
+    QCOMPARE(widget->icon().pixmap(24, 24).toImage(), QIcon(icon).pixmap(24, 24).toImage());
+    QCOMPARE(widget->toolTip(), toolTip);
+    QVERIFY(widget->text().isEmpty());
+    QCOMPARE(widget->isEnabled(), enabled);
 }
 
 void tst_QCJobTemplateDetailWidget::open(const std::shared_ptr<QCJobTemplate>& jobTemplate)
