@@ -726,6 +726,19 @@ void tst_QCJobTemplateDetailWidget::pickersFetchAndRememberTheirPlace()
         QCOMPARE(settings.value(g + QStringLiteral("/LastSelectedPath")).toString(), QLatin1String(g) == group ? "/Shelf" : QString());
         QCOMPARE(settings.value(g + QStringLiteral("/DispatcherId")).toString(), QLatin1String(g) == group ? kSecondStore : "");
     }
+
+    // After a restart the same picker opens where it was left.
+    m_modified.reset();
+    m_widget = std::make_unique<QCJobTemplateDetailWidget>(
+        m_store->model(), nullptr, m_model,
+        std::make_shared<GeneralSettings>(std::vector<std::string>{"", kSecondStore}, "D65", "10"));
+    m_widget->reloadFromModel();
+    std::shared_ptr<SelectedPath> openedAt;
+    pickInNextDialog({}, {}, {}, nullptr, &openedAt);
+    QTest::mouseClick(m_widget->findChild<QToolButton*>(button), Qt::LeftButton);
+    QVERIFY(openedAt);
+    QCOMPARE(openedAt->dispatcherId(), std::string(kSecondStore));
+    QCOMPARE(openedAt->path(), std::vector<std::string>{"Shelf"});
 }
 
 void tst_QCJobTemplateDetailWidget::propertyPositionIsSharedWithTheLibraryPicker()
