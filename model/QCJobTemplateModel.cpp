@@ -18,6 +18,7 @@
 
 #include <QBuffer>
 #include <QFile>
+#include <QFileInfo>
 #include <QPixmap>
 #include <QRect>
 
@@ -290,20 +291,44 @@ std::shared_ptr<vemi::SchematicImage> QCJobTemplateModel::templateSchematic()
     return m_template->schematicImage();
 }
 
+bool QCJobTemplateModel::readSchematicFile(const QString& path, QByteArray* bytes, QString* errorMessage)
+{
+    const auto fail = [&](const QString& cause) {
+        if (errorMessage)
+            *errorMessage = tr("Could not read the schematic image %1: %2").arg(path, cause);
+        return false;
+    };
+    // Checked before opening: opening a pipe waits for a writer, and a
+    // device may never end.
+    const QFileInfo info(path);
+    if (!info.exists())
+        return fail(tr("No such file."));
+    if (info.isDir())
+        return fail(tr("It is a directory."));
+    if (!info.isFile())
+        return fail(tr("It is not a regular file."));
+    if (info.size() > MaximumSchematicFileBytes)
+        return fail(tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes));
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly))
+        return fail(file.errorString());
+    // One byte more than allowed tells a file that grew since the check.
+    QByteArray read = file.read(MaximumSchematicFileBytes + 1);
+    if (file.error() != QFileDevice::NoError)
+        return fail(file.errorString());
+    if (read.size() > MaximumSchematicFileBytes)
+        return fail(tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes));
+    if (read.isEmpty())
+        return fail(tr("The file is empty."));
+    *bytes = std::move(read);
+    return true;
+}
+
 bool QCJobTemplateModel::loadSchematicImage(const QString& name, const QString& path, QString* errorMessage)
 {
-    QFile file(path);
     QByteArray bytes;
-    if (file.open(QIODevice::ReadOnly))
-        bytes = file.readAll();
-    if (file.error() != QFileDevice::NoError || bytes.isEmpty()) {
-        if (errorMessage) {
-            const QString cause = file.error() != QFileDevice::NoError ? file.errorString()
-                                                                       : tr("The file is empty.");
-            *errorMessage = tr("Could not read the schematic image %1: %2").arg(path, cause);
-        }
+    if (!readSchematicFile(path, &bytes, errorMessage))
         return false;
-    }
     const auto image = templateSchematic();
     image->setFormat(formatOfPath(path));
     image->setName(name.toStdString());
