@@ -122,8 +122,18 @@ QPen overlayPen(const QColor& colour)
     return QPen(QBrush(colour), 1.0, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin);
 }
 
-QStringList runFileDialog(QFileDialog& dialog)
+// A view of the bytes without copying them; valid while they are.
+QByteArray rawBytes(const std::vector<unsigned char>& bytes)
 {
+    return QByteArray::fromRawData(reinterpret_cast<const char*>(bytes.data()), int(bytes.size()));
+}
+
+QStringList chooseExistingFiles(QWidget* parent, const QString& startFolder, const QStringList& nameFilters)
+{
+    QFileDialog dialog(parent, QString(), QString(), QString());
+    dialog.setDirectory(startFolder);
+    dialog.setNameFilters(nameFilters);
+    dialog.setFileMode(QFileDialog::ExistingFiles);
     return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles() : QStringList();
 }
 
@@ -136,7 +146,7 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
     , m_store(store)
     , m_generalSettings(std::move(generalSettings))
     , m_ui(new Ui::QCJobTemplateDetailWidget)
-    , m_runFileDialog(runFileDialog)
+    , m_chooseFiles(chooseExistingFiles)
 {
     m_ui->setupUi(this);
 
@@ -609,9 +619,9 @@ void QCJobTemplateDetailWidget::onPreferredInstrumentChanged(std::shared_ptr<vem
 
 // --- Schematic pane ----------------------------------------------------------
 
-void QCJobTemplateDetailWidget::setFileDialogRunner(FileDialogRunner runner)
+void QCJobTemplateDetailWidget::setFileChooser(FileChooser chooser)
 {
-    m_runFileDialog = runner ? std::move(runner) : FileDialogRunner(runFileDialog);
+    m_chooseFiles = chooser ? std::move(chooser) : FileChooser(chooseExistingFiles);
 }
 
 void QCJobTemplateDetailWidget::clearSchematicScene()
@@ -653,10 +663,9 @@ void QCJobTemplateDetailWidget::showStoredSchematic()
     const QString name = QString::fromStdString(schematic->name());
     const auto& data = schematic->imageData();
     if (data.size() > StoredSchematicMinimumBytes) {
-        const QByteArray bytes = QByteArray::fromRawData(reinterpret_cast<const char*>(data.data()), int(data.size()));
         QImage image;
         QSize declared;
-        const auto result = SchematicImageDecoder::decode(bytes, QByteArray::fromStdString(schematic->format()),
+        const auto result = SchematicImageDecoder::decode(rawBytes(data), QByteArray::fromStdString(schematic->format()),
                                                           &image, &declared);
         // Shown in the pane rather than in a box: opening a template must not stop.
         if (result == SchematicImageDecoder::Result::TooLarge)
@@ -680,17 +689,15 @@ void QCJobTemplateDetailWidget::showSchematicMessage(const QString& text)
 
 QString QCJobTemplateDetailWidget::chooseSchematicFile()
 {
-    QFileDialog dialog(this, QString(), QString(), QString());
     QSettings settings;
     QString start = settings.value(PellamKeys::SchematicImagePath).toString();
     if (start.isEmpty())
         start = QStandardPaths::standardLocations(QStandardPaths::DesktopLocation).value(0);
     // The key holds the file chosen last; the dialog opens in its folder.
     const QFileInfo remembered(start);
-    dialog.setDirectory(remembered.isFile() ? remembered.absolutePath() : start);
-    dialog.setNameFilters({tr("Image files (*.jpg *.jpeg *.png *.gif)"), tr("All files (*.*)")});
-    dialog.setFileMode(QFileDialog::ExistingFiles);
-    const QStringList files = m_runFileDialog(dialog);
+    const QStringList files =
+        m_chooseFiles(this, remembered.isFile() ? remembered.absolutePath() : start,
+                      {tr("Image files (*.jpg *.jpeg *.png *.gif)"), tr("All files (*.*)")});
     if (files.isEmpty() || files.first().isEmpty())
         return QString();
     settings.setValue(PellamKeys::SchematicImagePath, files.first());
@@ -712,12 +719,12 @@ void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked()
                    .arg(QDir::toNativeSeparators(fileName)));
         return;
     }
-    QByteArray bytes;
+    std::vector<unsigned char> bytes;
     QImage image;
     QSize declared;
     const bool read = QCJobTemplateModel::readSchematicFile(m_schematicPath, &bytes);
     // The content alone decides the decoder, whatever the file is called.
-    const auto result = read ? SchematicImageDecoder::decode(bytes, QByteArray(), &image, &declared)
+    const auto result = read ? SchematicImageDecoder::decode(rawBytes(bytes), QByteArray(), &image, &declared)
                              : SchematicImageDecoder::Result::NotAnImage;
     if (result == SchematicImageDecoder::Result::TooLarge) {
         inform(tr("Cannot load %1. The picture measures %2 × %3 pixels; a schematic may have at most %4 pixels "
@@ -729,13 +736,14 @@ void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked()
                    .arg(SchematicImageDecoder::MaximumPixels / 1'000'000));
         return;
     }
-    // The model reads the file again; should that fail, the stored picture stays.
-    if (result != SchematicImageDecoder::Result::Decoded
-        || !m_model->loadSchematicImage(fileName, m_schematicPath)) {
+    if (result != SchematicImageDecoder::Result::Decoded) {
         inform(tr("Cannot load %1.").arg(m_schematicPath));
         m_ui->schematicGraphicsView->setToolTip(tr("Select an image for Job Schematic."));
         return;
     }
+    // The bytes just decoded are stored, not the file read once more: the file
+    // may have changed in between.
+    m_model->storeSchematicImage(fileName, m_schematicPath, std::move(bytes));
     clearSchematicScene();
     showSchematicImage(std::move(image));
     emitModified();

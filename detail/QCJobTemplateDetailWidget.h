@@ -11,7 +11,6 @@
 
 class GraphicsZoomView;
 class QCJobTemplateModel;
-class QFileDialog;
 class QGraphicsScene;
 class QImage;
 
@@ -54,11 +53,12 @@ public:
     // nothing else is reloaded, so an edit in progress is left alone.
     void refreshTemplateName();
 
-    // Runs the schematic file dialog and returns the chosen files, none when
-    // it was cancelled. Tests replace it: a platform's native dialog cannot
-    // be driven.
-    using FileDialogRunner = std::function<QStringList(QFileDialog& dialog)>;
-    void setFileDialogRunner(FileDialogRunner runner);
+    // Asks for existing files in a dialog that opens in startFolder and offers
+    // nameFilters; returns the chosen files, none when it was cancelled. Tests
+    // replace it: a platform's native dialog cannot be driven.
+    using FileChooser =
+        std::function<QStringList(QWidget* parent, const QString& startFolder, const QStringList& nameFilters)>;
+    void setFileChooser(FileChooser chooser);
 
 signals:
     void sgJobTemplateWasModified(std::shared_ptr<vemi::QCJobTemplate> jobTemplate);
@@ -150,7 +150,7 @@ private:
     std::unique_ptr<QGraphicsItemLayer> m_overlayLayer;
     bool m_overlayInScene = false;
     GraphicsZoomView* m_zoom = nullptr;
-    FileDialogRunner m_runFileDialog;
+    FileChooser m_chooseFiles;
     QString m_schematicPath;
     std::shared_ptr<SelectedPath> m_libraryPath;
     std::shared_ptr<SelectedPath> m_standardPath;

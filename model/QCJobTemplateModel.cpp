@@ -23,6 +23,7 @@
 #include <QRect>
 
 #include <algorithm>
+#include <cstring>
 #include <stdexcept>
 
 namespace {
@@ -30,9 +31,13 @@ namespace {
 const char* const firstMatchPoint = "<CP1>";
 const char* const secondMatchPoint = "<CP2>";
 
+// One block copy: a schematic may hold 10 MB.
 std::vector<unsigned char> toBytes(const QByteArray& bytes)
 {
-    return std::vector<unsigned char>(bytes.cbegin(), bytes.cend());
+    std::vector<unsigned char> result(std::size_t(bytes.size()));
+    if (!bytes.isEmpty())
+        std::memcpy(result.data(), bytes.constData(), result.size());
+    return result;
 }
 
 // The text after the last "." of the path, or the whole path without one.
@@ -291,7 +296,8 @@ std::shared_ptr<vemi::SchematicImage> QCJobTemplateModel::templateSchematic()
     return m_template->schematicImage();
 }
 
-bool QCJobTemplateModel::readSchematicFile(const QString& path, QByteArray* bytes, QString* errorMessage)
+bool QCJobTemplateModel::readSchematicFile(const QString& path, std::vector<unsigned char>* bytes,
+                                           QString* errorMessage)
 {
     const auto fail = [&](const QString& cause) {
         if (errorMessage)
@@ -307,18 +313,24 @@ bool QCJobTemplateModel::readSchematicFile(const QString& path, QByteArray* byte
         return fail(tr("It is a directory."));
     if (!info.isFile())
         return fail(tr("It is not a regular file."));
+    const QString tooLarge = tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes);
     if (info.size() > MaximumSchematicFileBytes)
-        return fail(tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes));
+        return fail(tooLarge);
     QFile file(path);
-    if (!file.open(QIODevice::ReadOnly))
+    if (!file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
         return fail(file.errorString());
-    // One byte more than allowed tells a file that grew since the check.
-    QByteArray read = file.read(MaximumSchematicFileBytes + 1);
-    if (file.error() != QFileDevice::NoError)
+    // Read straight into the vector the template keeps: no copy of 10 MB.
+    std::vector<unsigned char> read(std::size_t(info.size()));
+    const qint64 count = file.read(reinterpret_cast<char*>(read.data()), qint64(read.size()));
+    if (count < 0)
         return fail(file.errorString());
-    if (read.size() > MaximumSchematicFileBytes)
-        return fail(tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes));
-    if (read.isEmpty())
+    read.resize(std::size_t(count));
+    // The size was checked before reading; a file that grew since is refused
+    // rather than read on.
+    char extra = 0;
+    if (file.read(&extra, 1) > 0)
+        return fail(tr("It changed while it was read."));
+    if (read.empty())
         return fail(tr("The file is empty."));
     *bytes = std::move(read);
     return true;
@@ -326,15 +338,21 @@ bool QCJobTemplateModel::readSchematicFile(const QString& path, QByteArray* byte
 
 bool QCJobTemplateModel::loadSchematicImage(const QString& name, const QString& path, QString* errorMessage)
 {
-    QByteArray bytes;
+    std::vector<unsigned char> bytes;
     if (!readSchematicFile(path, &bytes, errorMessage))
         return false;
+    storeSchematicImage(name, path, std::move(bytes));
+    return true;
+}
+
+void QCJobTemplateModel::storeSchematicImage(const QString& name, const QString& path,
+                                             std::vector<unsigned char> bytes)
+{
     const auto image = templateSchematic();
     image->setFormat(formatOfPath(path));
     image->setName(name.toStdString());
     image->setOriginalFilename(path.toStdString());
-    image->setImageData(toBytes(bytes));
-    return true;
+    image->setImageData(std::move(bytes));
 }
 
 void QCJobTemplateModel::clearSchematicImage()
