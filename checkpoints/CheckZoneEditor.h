@@ -1,5 +1,6 @@
 #pragma once
 
+#include <QPixmap>
 #include <QRect>
 #include <QWidget>
 
@@ -30,6 +31,8 @@ public:
     void init(vemi::MarloModel& store, std::shared_ptr<QCJobTemplateModel> model);
     // Adding checkpoints needs a measurement configuration on the template.
     void onMeasurementConfigLoaded();
+    void setCurrentThumbnail(int cpIndex, QPixmap pixmap);
+    void publishCheckPoints();
 
 signals:
     void sgGrabRubberBandedArea(int selectedCheckZoneIndex);

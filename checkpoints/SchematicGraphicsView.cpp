@@ -32,7 +32,9 @@ void SchematicGraphicsView::resetBand()
 {
     m_origin = QPoint();
     m_endPoint = QPoint();
-    m_band->setGeometry(QRect(m_origin, m_endPoint).normalized());
+    // Empty, not the single pixel at the origin: after a reset nothing is
+    // selected until the next drag.
+    m_band->setGeometry(QRect(m_origin, QSize(0, 0)));
 }
 
 QRect SchematicGraphicsView::selectionRect() const

@@ -2,6 +2,9 @@
 #include "ui_QCJobTemplateDetailWidget.h"
 
 #include "checkpoints/CheckZoneEditor.h"
+#include "checkpoints/SchematicGraphicsView.h"
+#include "detail/GraphicsZoomView.h"
+#include "detail/SchematicImageDecoder.h"
 
 #include "host/client/GeneralSettings.h"
 #include "host/client/ToleranceFactory.h"
@@ -27,16 +30,25 @@
 #include "host/store/HostMetaTypes.h"
 #include "host/widgets/ImageRepository.h"
 #include "host/widgets/ObjectBrowserDialog.h"
+#include "host/widgets/QGraphicsItemLayer.h"
 #include "host/widgets/SelectedPath.h"
 #include "host/widgets/TagDefinitionDialog.h"
 #include "host/widgets/UIHelper.h"
 #include "model/QCJobTemplateModel.h"
 #include "plugin/PellamSettingsKeys.h"
 
+#include <QDir>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QGraphicsEllipseItem>
 #include <QGraphicsPixmapItem>
+#include <QGraphicsRectItem>
 #include <QGraphicsScene>
+#include <QGraphicsSimpleTextItem>
+#include <QGuiApplication>
 #include <QMessageBox>
 #include <QSettings>
+#include <QStandardPaths>
 
 #include <algorithm>
 #include <functional>
@@ -79,6 +91,52 @@ QIcon standardIcon(const QIcon& base, const Standard& standard)
     return icon;
 }
 
+// A stored schematic of this many bytes or fewer counts as no picture.
+constexpr std::size_t StoredSchematicMinimumBytes = 100;
+
+// Overlay circles are coloured by couple ordinal, twelve colours in turn,
+// starting with Qt::red for single checkpoints.
+Qt::GlobalColor circleColour(int coupleOrdinal)
+{
+    return Qt::GlobalColor(Qt::red + ((coupleOrdinal % 12) + 12) % 12);
+}
+
+// The number stays readable: black on light circles, white on dark ones.
+QColor numberColour(Qt::GlobalColor circle)
+{
+    switch (circle) {
+    case Qt::white:
+    case Qt::lightGray:
+    case Qt::green:
+    case Qt::cyan:
+    case Qt::magenta:
+    case Qt::yellow:
+        return QColor(Qt::black);
+    default:
+        return QColor(Qt::white);
+    }
+}
+
+QPen overlayPen(const QColor& colour)
+{
+    return QPen(QBrush(colour), 1.0, Qt::SolidLine, Qt::RoundCap, Qt::RoundJoin);
+}
+
+// A view of the bytes without copying them; valid while they are.
+QByteArray rawBytes(const std::vector<unsigned char>& bytes)
+{
+    return QByteArray::fromRawData(reinterpret_cast<const char*>(bytes.data()), int(bytes.size()));
+}
+
+QStringList chooseExistingFiles(QWidget* parent, const QString& startFolder, const QStringList& nameFilters)
+{
+    QFileDialog dialog(parent, QString(), QString(), QString());
+    dialog.setDirectory(startFolder);
+    dialog.setNameFilters(nameFilters);
+    dialog.setFileMode(QFileDialog::ExistingFiles);
+    return dialog.exec() == QDialog::Accepted ? dialog.selectedFiles() : QStringList();
+}
+
 } // namespace
 
 QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget* parent,
@@ -88,11 +146,15 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
     , m_store(store)
     , m_generalSettings(std::move(generalSettings))
     , m_ui(new Ui::QCJobTemplateDetailWidget)
+    , m_chooseFiles(chooseExistingFiles)
 {
     m_ui->setupUi(this);
 
     m_scene = std::make_unique<QGraphicsScene>();
+    m_overlayLayer = std::make_unique<QGraphicsItemLayer>();
     m_ui->schematicGraphicsView->setScene(m_scene.get());
+    m_zoom = new GraphicsZoomView(m_ui->schematicGraphicsView);
+    m_zoom->setModifiers(Qt::ControlModifier);
 
     m_model = std::move(model);
 
@@ -113,6 +175,12 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
             &QCJobTemplateDetailWidget::onTemplateSavable);
     connect(m_ui->checkZoneEditor, &CheckZoneEditor::sgGrabRubberBandedArea, this,
             &QCJobTemplateDetailWidget::onGrabRubberBandedImageArea);
+    connect(m_ui->checkZoneEditor, &CheckZoneEditor::sgAddCheckpointToSchematic, this,
+            &QCJobTemplateDetailWidget::addCheckPointToSchematic);
+    connect(m_ui->checkZoneEditor, &CheckZoneEditor::sgRefreshCheckPointLayer, this,
+            &QCJobTemplateDetailWidget::refreshCheckPointLayer);
+    connect(m_model.get(), &QCJobTemplateModel::sgTemplateSaveFailed, this,
+            &QCJobTemplateDetailWidget::showTemplateSaveFailed);
     connect(m_ui->tagDisplayWidget, SIGNAL(tagRowsSelected(int, QStringList)), this,
             SLOT(tagRowsSelected(int, QStringList)));
     connect(m_ui->tagDisplayWidget, SIGNAL(tagRowDoubleClicked(int, std::string)), this,
@@ -142,6 +210,8 @@ QCJobTemplateDetailWidget::~QCJobTemplateDetailWidget()
     settings.setValue(PellamKeys::QcJobTemplateSplitterState, m_ui->qcJobTemplateSplitter->saveState());
     // The view dies with the form, after the scene; it must not draw a deleted scene.
     m_ui->schematicGraphicsView->setScene(nullptr);
+    if (m_overlayInScene)
+        m_scene->removeItem(m_overlayLayer.get());
     delete m_ui;
 }
 
@@ -153,18 +223,7 @@ void QCJobTemplateDetailWidget::reloadFromModel()
     showTemplateName(QString::fromStdString(jobTemplate->name()));
     m_ui->enableRepeatCheckBox->setChecked(jobTemplate->enableRepeat());
 
-    clearSchematicScene();
-    const auto schematic = jobTemplate->schematicImage();
-    if (schematic && schematic->imageData().size() > 100) {
-        const auto& bytes = schematic->imageData();
-        QImage image;
-        image.loadFromData(bytes.data(), int(bytes.size()), schematic->format().c_str());
-        showSchematicImage(image);
-        setSchematicControlsEnabled(true);
-    }
-    const QString schematicName = schematic ? QString::fromStdString(schematic->name()) : QString();
-    m_ui->schematicNameLabel->setText(schematicName);
-    m_ui->schematicNameLabel->setToolTip(schematicName);
+    showStoredSchematic();
 
     m_ui->descriptionEdit->setText(QString::fromStdString(jobTemplate->description()));
     // The beginning of a long description shows, not its end.
@@ -545,21 +604,45 @@ void QCJobTemplateDetailWidget::onPropertyLibraryLoaded(std::shared_ptr<Response
     emitModified();
 }
 
-// --- Schematic pane and measurement configuration: their behaviour is not
-// part of this editor yet; the controls exist so the form is complete.
+// --- Measurement configuration: its behaviour is not part of this editor
+// yet; the controls exist so the form is complete.
+
+void QCJobTemplateDetailWidget::onSavedMc(std::shared_ptr<vemi::Response>) {}
+void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo>) {}
+void QCJobTemplateDetailWidget::onSaveProgress(std::shared_ptr<vemi::Response>) {}
+void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked() {}
+
+// Instrument events need no action in the template editor.
+void QCJobTemplateDetailWidget::onInstrumentConnected(std::shared_ptr<vemi::Instrument>) {}
+void QCJobTemplateDetailWidget::onInstrumentDisconnected(std::shared_ptr<vemi::Instrument>) {}
+void QCJobTemplateDetailWidget::onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>) {}
+
+// --- Schematic pane ----------------------------------------------------------
+
+void QCJobTemplateDetailWidget::setFileChooser(FileChooser chooser)
+{
+    m_chooseFiles = chooser ? std::move(chooser) : FileChooser(chooseExistingFiles);
+}
 
 void QCJobTemplateDetailWidget::clearSchematicScene()
 {
-    m_scene->clear();
+    refreshCheckPointLayer();
     setSchematicControlsEnabled(false);
+    m_scene->clear();
+    m_scene->setSceneRect(0, 0, 1, 1);
+    m_zoom->resetZoom();
+    m_overlayInScene = false;
+    m_ui->schematicNameLabel->setText(QString());
+    m_ui->schematicNameLabel->setToolTip(QString());
 }
 
-void QCJobTemplateDetailWidget::showSchematicImage(const QImage& image)
+void QCJobTemplateDetailWidget::showSchematicImage(QImage image)
 {
+    setSchematicControlsEnabled(true);
     if (image.isNull())
         return;
-    m_scene->addPixmap(QPixmap::fromImage(image));
-    m_scene->setSceneRect(m_scene->itemsBoundingRect());
+    m_scene->setSceneRect(0, 0, image.width(), image.height());
+    m_scene->addPixmap(QPixmap::fromImage(std::move(image)));
 }
 
 void QCJobTemplateDetailWidget::setSchematicControlsEnabled(bool on)
@@ -567,24 +650,224 @@ void QCJobTemplateDetailWidget::setSchematicControlsEnabled(bool on)
     for (QWidget* button : {m_ui->cropSchematicButton, m_ui->clearSchematicButton, m_ui->resetZoomButton,
                             m_ui->fitToWindowButton, m_ui->zoomInButton, m_ui->zoomOutButton})
         button->setEnabled(on);
+    m_ui->schematicGraphicsView->setBandVisible(on);
+    m_ui->schematicGraphicsView->resetBand();
 }
 
-void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::on_cropSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::on_fitToWindowButton_clicked() {}
-void QCJobTemplateDetailWidget::on_resetZoomButton_clicked() {}
-void QCJobTemplateDetailWidget::on_clearSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::onSavedMc(std::shared_ptr<vemi::Response>) {}
-void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo>) {}
-void QCJobTemplateDetailWidget::onSaveProgress(std::shared_ptr<vemi::Response>) {}
-void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int) {}
-void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked() {}
-void QCJobTemplateDetailWidget::on_zoomInButton_clicked() {}
-void QCJobTemplateDetailWidget::on_zoomOutButton_clicked() {}
+void QCJobTemplateDetailWidget::showStoredSchematic()
+{
+    clearSchematicScene();
+    const auto schematic = m_model->jobTemplate()->schematicImage();
+    if (!schematic)
+        return;
+    const QString name = QString::fromStdString(schematic->name());
+    const auto& data = schematic->imageData();
+    if (data.size() > StoredSchematicMinimumBytes) {
+        QImage image;
+        QSize declared;
+        const auto result = SchematicImageDecoder::decode(rawBytes(data), QByteArray::fromStdString(schematic->format()),
+                                                          &image, &declared);
+        // Shown in the pane rather than in a box: opening a template must not stop.
+        if (result == SchematicImageDecoder::Result::TooLarge)
+            showSchematicMessage(tr("The schematic picture %1 is not shown: it measures %2 × %3 pixels, more than "
+                                    "a schematic may have.")
+                                     .arg(name)
+                                     .arg(declared.width())
+                                     .arg(declared.height()));
+        // Controls stay usable whatever was decoded, so a broken picture can be cleared.
+        showSchematicImage(std::move(image));
+    }
+    m_ui->schematicNameLabel->setText(name);
+    m_ui->schematicNameLabel->setToolTip(name);
+}
 
-// Instrument events need no action in the template editor.
-void QCJobTemplateDetailWidget::onInstrumentConnected(std::shared_ptr<vemi::Instrument>) {}
-void QCJobTemplateDetailWidget::onInstrumentDisconnected(std::shared_ptr<vemi::Instrument>) {}
-void QCJobTemplateDetailWidget::onPreferredInstrumentChanged(std::shared_ptr<vemi::Instrument>) {}
+void QCJobTemplateDetailWidget::showSchematicMessage(const QString& text)
+{
+    auto* notice = m_scene->addSimpleText(text);
+    m_scene->setSceneRect(notice->boundingRect());
+}
+
+QString QCJobTemplateDetailWidget::chooseSchematicFile()
+{
+    QSettings settings;
+    QString start = settings.value(PellamKeys::SchematicImagePath).toString();
+    if (start.isEmpty())
+        start = QStandardPaths::standardLocations(QStandardPaths::DesktopLocation).value(0);
+    // The key holds the file chosen last; the dialog opens in its folder.
+    const QFileInfo remembered(start);
+    const QStringList files =
+        m_chooseFiles(this, remembered.isFile() ? remembered.absolutePath() : start,
+                      {tr("Image files (*.jpg *.jpeg *.png *.gif)"), tr("All files (*.*)")});
+    if (files.isEmpty() || files.first().isEmpty())
+        return QString();
+    settings.setValue(PellamKeys::SchematicImagePath, files.first());
+    return files.first();
+}
+
+void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked()
+{
+    m_schematicPath = chooseSchematicFile();
+    if (m_schematicPath.isEmpty())
+        return;
+    const QFileInfo file(m_schematicPath);
+    const QString fileName = file.fileName();
+    const auto inform = [this](const QString& text) {
+        QMessageBox::information(this, QGuiApplication::applicationDisplayName(), text, QMessageBox::Ok);
+    };
+    if (file.size() > QCJobTemplateModel::MaximumSchematicFileBytes) {
+        inform(tr(" Cannot load %1. Please limit image size to no more than 10 MB.")
+                   .arg(QDir::toNativeSeparators(fileName)));
+        return;
+    }
+    std::vector<unsigned char> bytes;
+    QImage image;
+    QSize declared;
+    const bool read = QCJobTemplateModel::readSchematicFile(m_schematicPath, &bytes);
+    // The content alone decides the decoder, whatever the file is called.
+    const auto result = read ? SchematicImageDecoder::decode(rawBytes(bytes), QByteArray(), &image, &declared)
+                             : SchematicImageDecoder::Result::NotAnImage;
+    if (result == SchematicImageDecoder::Result::TooLarge) {
+        inform(tr("Cannot load %1. The picture measures %2 × %3 pixels; a schematic may have at most %4 pixels "
+                  "on a side and %5 million pixels in all.")
+                   .arg(QDir::toNativeSeparators(fileName))
+                   .arg(declared.width())
+                   .arg(declared.height())
+                   .arg(SchematicImageDecoder::MaximumSide)
+                   .arg(SchematicImageDecoder::MaximumPixels / 1'000'000));
+        return;
+    }
+    if (result != SchematicImageDecoder::Result::Decoded) {
+        inform(tr("Cannot load %1.").arg(m_schematicPath));
+        m_ui->schematicGraphicsView->setToolTip(tr("Select an image for Job Schematic."));
+        return;
+    }
+    // The bytes just decoded are stored, not the file read once more: the file
+    // may have changed in between.
+    m_model->storeSchematicImage(fileName, m_schematicPath, std::move(bytes));
+    clearSchematicScene();
+    showSchematicImage(std::move(image));
+    emitModified();
+    m_ui->schematicNameLabel->setText(fileName);
+    m_ui->schematicNameLabel->setToolTip(fileName);
+}
+
+void QCJobTemplateDetailWidget::on_clearSchematicButton_clicked()
+{
+    const auto answer = QMessageBox::question(this, QStringLiteral("Confirm Delete"),
+                                              QStringLiteral("Are you sure you want to clear the schematic image?"),
+                                              QMessageBox::Yes | QMessageBox::No, QMessageBox::NoButton);
+    if (answer != QMessageBox::Yes)
+        return;
+    clearSchematicScene();
+    m_model->clearSchematicImage();
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::showTemplateSaveFailed(const QString& message)
+{
+    QMessageBox::warning(this, QGuiApplication::applicationDisplayName(),
+                         tr("The template could not be saved after its schematic image was cleared: %1").arg(message),
+                         QMessageBox::Ok);
+}
+
+// Replaces the scene by what the view shows now, without the overlay and the band.
+void QCJobTemplateDetailWidget::on_cropSchematicButton_clicked()
+{
+    m_overlayLayer->setVisible(false);
+    m_ui->schematicGraphicsView->setBandVisible(false);
+    const QImage shown = m_ui->schematicGraphicsView->grab().toImage();
+    const int width = shown.width();
+    const int height = shown.height();
+    const QImage part = shown.copy(0, 0, width - 10, height - 10);
+    clearSchematicScene();
+    m_scene->setSceneRect(0, 0, width, height);
+    m_overlayLayer->setVisible(true);
+    m_scene->addPixmap(QPixmap::fromImage(part));
+    setSchematicControlsEnabled(true);
+    emitModified();
+}
+
+void QCJobTemplateDetailWidget::on_fitToWindowButton_clicked()
+{
+    m_ui->schematicGraphicsView->fitInView(m_scene->itemsBoundingRect(), Qt::KeepAspectRatio);
+}
+
+void QCJobTemplateDetailWidget::on_resetZoomButton_clicked()
+{
+    m_zoom->resetZoom();
+}
+
+void QCJobTemplateDetailWidget::on_zoomInButton_clicked()
+{
+    m_zoom->setTargetToViewBottomCentre();
+    m_zoom->gentleZoom(1.2);
+}
+
+void QCJobTemplateDetailWidget::on_zoomOutButton_clicked()
+{
+    m_zoom->setTargetToViewBottomCentre();
+    m_zoom->gentleZoom(0.8);
+}
+
+// The area is cut from the band's own rectangle, exactly what the user sees;
+// its position is stored in scene coordinates, its size in view pixels.
+void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int cpIndex)
+{
+    SchematicGraphicsView* view = m_ui->schematicGraphicsView;
+    const QRect band(view->bandTopLeft(), view->bandSize());
+    // A press without a drag leaves an empty band: there is no area to take.
+    if (band.isEmpty() || cpIndex < 0 || cpIndex >= m_model->checkPointCount())
+        return;
+    view->setBandVisible(false);
+    m_overlayLayer->setVisible(false);
+    const QPixmap shown = view->grab();
+    const qreal ratio = shown.devicePixelRatio();
+    const QPixmap area = shown.copy(QRectF(QPointF(band.topLeft()) * ratio, QSizeF(band.size()) * ratio).toRect());
+    const QPointF origin = m_zoom->mapToScene(band.topLeft());
+    const QRect rect(int(origin.x()), int(origin.y()), band.width(), band.height());
+    m_model->setCheckPointImage(cpIndex, area, rect);
+    m_ui->checkZoneEditor->setCurrentThumbnail(cpIndex, area);
+    view->setBandVisible(true);
+    view->resetBand();
+    refreshCheckPointLayer();
+    m_overlayLayer->setVisible(true);
+    m_ui->checkZoneEditor->publishCheckPoints();
+}
+
+void QCJobTemplateDetailWidget::addCheckPointToSchematic(int cpIndex, int coupletId, QRect rect)
+{
+    const Qt::GlobalColor circle = circleColour(coupletId);
+    const QColor number = numberColour(circle);
+    QGraphicsItem* layer = m_overlayLayer.get();
+
+    auto* area = new QGraphicsRectItem(rect, layer);
+    area->setBrush(QColor(30, 100, 150, 100));
+    area->setPen(overlayPen(QColor(50, 50, 50, 200)));
+
+    auto* disc = new QGraphicsEllipseItem(rect.x() - 9, rect.y() - 9, 20, 20, layer);
+    disc->setBrush(QColor(circle));
+    disc->setPen(overlayPen(number));
+
+    auto* label = new QGraphicsSimpleTextItem(QString::number(cpIndex + 1), layer);
+    label->setPos(rect.x() - 2, rect.y() - 6);
+    label->setBrush(number);
+    label->setPen(QPen(number));
+
+    // Items made under a layer that is already in the scene join it at once;
+    // taking the layer out and in for each checkpoint would cost the square.
+    if (!m_overlayInScene) {
+        m_scene->addItem(layer);
+        m_overlayInScene = true;
+    }
+}
+
+void QCJobTemplateDetailWidget::refreshCheckPointLayer()
+{
+    if (!m_overlayInScene)
+        return;
+    m_scene->removeItem(m_overlayLayer.get());
+    m_overlayLayer = std::make_unique<QGraphicsItemLayer>();
+    m_overlayInScene = false;
+}
 
 } // namespace vemi

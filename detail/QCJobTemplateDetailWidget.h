@@ -1,12 +1,15 @@
 #pragma once
 
+#include <QRect>
 #include <QString>
 #include <QStringList>
 #include <QWidget>
 
+#include <functional>
 #include <memory>
 #include <string>
 
+class GraphicsZoomView;
 class QCJobTemplateModel;
 class QGraphicsScene;
 class QImage;
@@ -24,6 +27,7 @@ class Instrument;
 class MarloModel;
 class ObjectBrowserDialog;
 class QCJobTemplate;
+class QGraphicsItemLayer;
 class Response;
 class SelectedPath;
 class ToleranceSet;
@@ -48,6 +52,13 @@ public:
     // Shows the model's template's name again (after a rename in the browser);
     // nothing else is reloaded, so an edit in progress is left alone.
     void refreshTemplateName();
+
+    // Asks for existing files in a dialog that opens in startFolder and offers
+    // nameFilters; returns the chosen files, none when it was cancelled. Tests
+    // replace it: a platform's native dialog cannot be driven.
+    using FileChooser =
+        std::function<QStringList(QWidget* parent, const QString& startFolder, const QStringList& nameFilters)>;
+    void setFileChooser(FileChooser chooser);
 
 signals:
     void sgJobTemplateWasModified(std::shared_ptr<vemi::QCJobTemplate> jobTemplate);
@@ -116,8 +127,17 @@ private:
     bool findConditionMismatch(const std::shared_ptr<ToleranceSet>& set, QString* standardName,
                                QString* standardCondition, QString* toleranceCondition) const;
     void clearSchematicScene();
-    void showSchematicImage(const QImage& image);
+    void showSchematicImage(QImage image);
     void setSchematicControlsEnabled(bool on);
+    // Shows the template's stored picture, unless it is too short or too large.
+    void showStoredSchematic();
+    QString chooseSchematicFile();
+    void showSchematicMessage(const QString& text);
+    void showTemplateSaveFailed(const QString& message);
+    // The overlay: one numbered circle on a translucent rectangle per
+    // checkpoint with an area, drawn by the check list editor's signals.
+    void addCheckPointToSchematic(int cpIndex, int coupletId, QRect rect);
+    void refreshCheckPointLayer();
     void showTemplateName(const QString& name);
 
     MarloModel& m_store;
@@ -125,6 +145,12 @@ private:
     std::shared_ptr<GeneralSettings> m_generalSettings;
     Ui::QCJobTemplateDetailWidget* m_ui;
     std::unique_ptr<QGraphicsScene> m_scene;
+    // Owned here; while m_overlayInScene the scene holds it, and it is taken
+    // out again before the scene is cleared or destroyed.
+    std::unique_ptr<QGraphicsItemLayer> m_overlayLayer;
+    bool m_overlayInScene = false;
+    GraphicsZoomView* m_zoom = nullptr;
+    FileChooser m_chooseFiles;
     QString m_schematicPath;
     std::shared_ptr<SelectedPath> m_libraryPath;
     std::shared_ptr<SelectedPath> m_standardPath;

@@ -18,10 +18,12 @@
 
 #include <QBuffer>
 #include <QFile>
+#include <QFileInfo>
 #include <QPixmap>
 #include <QRect>
 
 #include <algorithm>
+#include <cstring>
 #include <stdexcept>
 
 namespace {
@@ -29,9 +31,13 @@ namespace {
 const char* const firstMatchPoint = "<CP1>";
 const char* const secondMatchPoint = "<CP2>";
 
+// One block copy: a schematic may hold 10 MB.
 std::vector<unsigned char> toBytes(const QByteArray& bytes)
 {
-    return std::vector<unsigned char>(bytes.cbegin(), bytes.cend());
+    std::vector<unsigned char> result(std::size_t(bytes.size()));
+    if (!bytes.isEmpty())
+        std::memcpy(result.data(), bytes.constData(), result.size());
+    return result;
 }
 
 // The text after the last "." of the path, or the whole path without one.
@@ -290,26 +296,63 @@ std::shared_ptr<vemi::SchematicImage> QCJobTemplateModel::templateSchematic()
     return m_template->schematicImage();
 }
 
+bool QCJobTemplateModel::readSchematicFile(const QString& path, std::vector<unsigned char>* bytes,
+                                           QString* errorMessage)
+{
+    const auto fail = [&](const QString& cause) {
+        if (errorMessage)
+            *errorMessage = tr("Could not read the schematic image %1: %2").arg(path, cause);
+        return false;
+    };
+    // Checked before opening: opening a pipe waits for a writer, and a
+    // device may never end.
+    const QFileInfo info(path);
+    if (!info.exists())
+        return fail(tr("No such file."));
+    if (info.isDir())
+        return fail(tr("It is a directory."));
+    if (!info.isFile())
+        return fail(tr("It is not a regular file."));
+    const QString tooLarge = tr("It is larger than %1 bytes.").arg(MaximumSchematicFileBytes);
+    if (info.size() > MaximumSchematicFileBytes)
+        return fail(tooLarge);
+    QFile file(path);
+    if (!file.open(QIODevice::ReadOnly | QIODevice::Unbuffered))
+        return fail(file.errorString());
+    // Read straight into the vector the template keeps: no copy of 10 MB.
+    std::vector<unsigned char> read(std::size_t(info.size()));
+    const qint64 count = file.read(reinterpret_cast<char*>(read.data()), qint64(read.size()));
+    if (count < 0)
+        return fail(file.errorString());
+    read.resize(std::size_t(count));
+    // The size was checked before reading; a file that grew since is refused
+    // rather than read on.
+    char extra = 0;
+    if (file.read(&extra, 1) > 0)
+        return fail(tr("It changed while it was read."));
+    if (read.empty())
+        return fail(tr("The file is empty."));
+    *bytes = std::move(read);
+    return true;
+}
+
 bool QCJobTemplateModel::loadSchematicImage(const QString& name, const QString& path, QString* errorMessage)
 {
-    QFile file(path);
-    QByteArray bytes;
-    if (file.open(QIODevice::ReadOnly))
-        bytes = file.readAll();
-    if (file.error() != QFileDevice::NoError || bytes.isEmpty()) {
-        if (errorMessage) {
-            const QString cause = file.error() != QFileDevice::NoError ? file.errorString()
-                                                                       : tr("The file is empty.");
-            *errorMessage = tr("Could not read the schematic image %1: %2").arg(path, cause);
-        }
+    std::vector<unsigned char> bytes;
+    if (!readSchematicFile(path, &bytes, errorMessage))
         return false;
-    }
+    storeSchematicImage(name, path, std::move(bytes));
+    return true;
+}
+
+void QCJobTemplateModel::storeSchematicImage(const QString& name, const QString& path,
+                                             std::vector<unsigned char> bytes)
+{
     const auto image = templateSchematic();
     image->setFormat(formatOfPath(path));
     image->setName(name.toStdString());
     image->setOriginalFilename(path.toStdString());
-    image->setImageData(toBytes(bytes));
-    return true;
+    image->setImageData(std::move(bytes));
 }
 
 void QCJobTemplateModel::clearSchematicImage()

@@ -82,10 +82,21 @@ public:
     // Replaces the couple at an item index by one with its members exchanged.
     void swapCoupledCheckPoints(int index);
 
+    // The largest schematic file that is read, in bytes.
+    static constexpr qint64 MaximumSchematicFileBytes = 10'000'000;
+    // Reads a schematic file: only a regular file of 1 to
+    // MaximumSchematicFileBytes bytes, and never more than that, so that a
+    // pipe or a device neither blocks nor floods the editor. Returns false
+    // with the reason in *errorMessage otherwise.
+    static bool readSchematicFile(const QString& path, std::vector<unsigned char>* bytes,
+                                  QString* errorMessage = nullptr);
     // The schematic pictures. Returns false, with the reason in
-    // *errorMessage, when the file cannot be read or is empty; the stored
-    // picture is then left as it was.
+    // *errorMessage, when the file cannot be read (see readSchematicFile);
+    // the stored picture is then left as it was.
     bool loadSchematicImage(const QString& name, const QString& path, QString* errorMessage = nullptr);
+    // The same with the file's bytes already read (readSchematicFile), so
+    // that what is stored is exactly what the caller decoded and showed.
+    void storeSchematicImage(const QString& name, const QString& path, std::vector<unsigned char> bytes);
     // Empties the template's picture and stores the template at once.
     void clearSchematicImage();
     // Stores area as the PNG cut-out of the checkpoint at a checkpoint index,

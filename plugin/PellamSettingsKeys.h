@@ -10,6 +10,8 @@ namespace PellamKeys {
 extern const QString MainSplitterState;
 extern const QString HorizontalSplitterState;
 extern const QString QcJobTemplateSplitterState;
+// The schematic file chosen last; the next file dialog starts beside it.
+extern const QString SchematicImagePath;
 
 // Groups of the pickers' remembered positions, each holding the two keys below.
 extern const QString LibraryPathGroup;

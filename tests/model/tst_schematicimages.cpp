@@ -1,4 +1,5 @@
 #include "tests/common/TestMain.h"
+#include "tests/common/PipeWithDeadline.h"
 #include "tests/common/RecordingDispatcher.h"
 #include "tests/common/TempStore.h"
 
@@ -132,6 +133,9 @@ void tst_SchematicImages::failedLoadKeepsStoredPicture_data()
     QTest::newRow("missing file") << "missing.png" << "No such file";
     QTest::newRow("folder") << "folder.png" << "directory";
     QTest::newRow("empty file") << "empty.png" << "empty";
+    QTest::newRow("larger than the limit") << "large.png" << "larger than 10000000 bytes";
+    QTest::newRow("named pipe") << "pipe.png" << "not a regular file";
+    QTest::newRow("endless device") << "/dev/zero" << "not a regular file";
 }
 
 void tst_SchematicImages::failedLoadKeepsStoredPicture()
@@ -145,9 +149,15 @@ void tst_SchematicImages::failedLoadKeepsStoredPicture()
     writeFile(goodPath, sampleBytes());
     QVERIFY(m_model->loadSchematicImage("good.jpg", goodPath));
 
-    const QString path = folder.filePath(fileName);
+    writeFile(folder.filePath("large.png"), QByteArray(10'000'001, 'x'));
+    // Should the model open the pipe, the watchdog ends the wait and the row fails.
+    PipeWithDeadline pipe(folder.filePath("pipe.png"));
+    QVERIFY(pipe.isValid());
+
+    const QString path = fileName.startsWith('/') ? fileName : folder.filePath(fileName);
     QString error;
     QVERIFY(!m_model->loadSchematicImage(fileName, path, &error));
+    QVERIFY(!pipe.readerWasStuck());
 
     QVERIFY2(error.contains(path) && error.contains(cause, Qt::CaseInsensitive), qPrintable(error));
     const auto& image = *m_template->schematicImage();
