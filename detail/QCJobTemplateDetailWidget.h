@@ -22,6 +22,7 @@ class GeneralSettings;
 class GlobalDirEntry;
 class Instrument;
 class MarloModel;
+class MeasurementConfiguration;
 class ObjectBrowserDialog;
 class QCJobTemplate;
 class Response;
@@ -119,6 +120,8 @@ private:
     void showSchematicImage(const QImage& image);
     void setSchematicControlsEnabled(bool on);
     void showTemplateName(const QString& name);
+    // Sends the UpdateObject; its answer comes to onSavedMc or onSaveError.
+    void storeMeasurementConfiguration(const std::shared_ptr<MeasurementConfiguration>& configuration);
 
     MarloModel& m_store;
     std::shared_ptr<QCJobTemplateModel> m_model;

@@ -6,6 +6,7 @@ namespace PellamKeys {
 const QString MainSplitterState = QStringLiteral("UI/Pellam/mainSplitterState");
 const QString HorizontalSplitterState = QStringLiteral("UI/Pellam/horizontalSplitterState");
 const QString QcJobTemplateSplitterState = QStringLiteral("UI/Pellam/qcJobTemplateSplitterState");
+const QString DialogSplitterState = QStringLiteral("UI/Pellam/dialogSplitterState");
 
 const QString LibraryPathGroup = QStringLiteral("Opal QC/LibraryPath");
 const QString StandardPathGroup = QStringLiteral("Opal QC/StandardPath");

@@ -10,6 +10,7 @@ namespace PellamKeys {
 extern const QString MainSplitterState;
 extern const QString HorizontalSplitterState;
 extern const QString QcJobTemplateSplitterState;
+extern const QString DialogSplitterState;
 
 // Groups of the pickers' remembered positions, each holding the two keys below.
 extern const QString LibraryPathGroup;
