@@ -18,6 +18,8 @@
 #include <QEvent>
 #include <QMessageBox>
 
+#include <map>
+
 namespace vemi {
 
 MeasurementConfigurationWidget::MeasurementConfigurationWidget(std::shared_ptr<GeneralSettings> settings,
@@ -134,18 +136,33 @@ std::shared_ptr<MeasurementConfiguration> MeasurementConfigurationWidget::measur
     if (m_keepStoredConditions)
         return m_configuration;
     m_configuration->setInstrumentModel(m_ui->instrumentComboBox->currentData(Qt::UserRole).toString().toStdString());
-    std::vector<std::shared_ptr<Property>> properties;
-    if (const auto conditions = m_conditionsWidget->measurementConditions()) {
-        for (const auto& group : conditions->settings()->groups())
-            for (const auto& section : group->sections())
-                for (const auto& setting : section->settings()) {
-                    const QString key = QString::fromStdString(setting->name());
-                    properties.push_back(std::make_shared<Property>(setting->name(),
-                                                                    conditions->settingValue(key).toStdString()));
-                }
-    }
-    m_configuration->setProperties(properties);
+    m_configuration->setProperties(currentProperties());
     return m_configuration;
+}
+
+// Every setting of the conditions shown, in the settings tree's order. A
+// property the configuration already has for a key is kept (with its id) and
+// given the current value, so that writing back the same values twice stores
+// the same object.
+std::vector<std::shared_ptr<Property>> MeasurementConfigurationWidget::currentProperties() const
+{
+    std::vector<std::shared_ptr<Property>> properties;
+    const auto conditions = m_conditionsWidget->measurementConditions();
+    if (!conditions)
+        return properties;
+    std::map<std::string, std::shared_ptr<Property>> existing;
+    for (const auto& property : m_configuration->properties())
+        existing.emplace(property->key(), property);
+    for (const auto& group : conditions->settings()->groups())
+        for (const auto& section : group->sections())
+            for (const auto& setting : section->settings()) {
+                const std::string value = conditions->settingValue(QString::fromStdString(setting->name())).toStdString();
+                const auto found = existing.find(setting->name());
+                auto property = found != existing.end() ? found->second : std::make_shared<Property>(setting->name());
+                property->setValue(value);
+                properties.push_back(property);
+            }
+    return properties;
 }
 
 void MeasurementConfigurationWidget::setConfigurationName(const std::string& name)

@@ -4,6 +4,7 @@
 
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace Ui {
 class MeasurementConfigurationWidget;
@@ -15,6 +16,7 @@ class GeneralSettings;
 class MeasurementConditions;
 class MeasurementConditionsWidget;
 class MeasurementConfiguration;
+class Property;
 
 // Edits one measurement configuration: its description, the instrument model
 // (a driver's library name) and that instrument's measurement conditions,
@@ -47,6 +49,7 @@ private:
     void selectInstrumentModel(const QString& libraryName);
     int indexOfLibrary(const QString& libraryName) const;
     void fillInstrumentList();
+    std::vector<std::shared_ptr<Property>> currentProperties() const;
 
     Ui::MeasurementConfigurationWidget* m_ui;
     std::shared_ptr<GeneralSettings> m_generalSettings;

@@ -3,6 +3,7 @@
 #include "tests/common/TempStore.h"
 
 #include "host/domain/DirEntry.h"
+#include "host/domain/Header.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/Property.h"
 #include "host/store/CreateFolder.h"
@@ -117,7 +118,9 @@ void tst_FolderBrowserWidget::select(const QString& name)
 {
     Node* target = node(name, "Plant") ? node(name, "Plant") : node(name);
     QVERIFY(target);
+    QSignalSpy selected(m_browser.get(), &FolderBrowserWidget::sgSelectionChanged);
     m_browser->browser()->treeView()->setCurrentIndex(m_model->indexFromNode(target));
+    QTRY_VERIFY(!selected.isEmpty());
 }
 
 QStringList tst_FolderBrowserWidget::storedEntries()

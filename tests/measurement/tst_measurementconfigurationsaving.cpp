@@ -4,6 +4,7 @@
 
 #include "detail/QCJobTemplateDetailWidget.h"
 #include "host/client/GeneralSettings.h"
+#include "host/domain/Header.h"
 #include "host/domain/MeasurementConfiguration.h"
 #include "host/domain/QCJobTemplate.h"
 #include "host/widgets/BaseObjectTreeModel.h"
@@ -97,7 +98,7 @@ void tst_MeasurementConfigurationSaving::chooseInDialog(const QString& name, con
         dialog->findChild<QLineEdit*>("descLineEdit")->setText(description);
         dialog->findChild<QDialogButtonBox*>("buttonBox")->button(button)->click();
     });
-    child<QPushButton>("addMeasurementConfigurationButton")->click();
+    child<QAbstractButton>("addMeasurementConfigurationButton")->click();
 }
 
 void tst_MeasurementConfigurationSaving::chosenConfigurationIsStoredAndShown()

@@ -10,6 +10,7 @@
 #include "host/widgets/MeasurementConditionsWidget.h"
 #include "measurement/MeasurementConfigurationWidget.h"
 
+#include <QAbstractButton>
 #include <QComboBox>
 #include <QDialog>
 #include <QLineEdit>
