@@ -96,6 +96,8 @@ void MeasurementConfigurationWidget::setMeasurementConfiguration(std::shared_ptr
     m_configuration = std::move(config);
     m_ui->descLineEdit->setEnabled(true);
     m_ui->descLineEdit->setText(QString::fromStdString(m_configuration->header()->description()));
+    // The beginning of a long description shows, not its end.
+    m_ui->descLineEdit->setCursorPosition(0);
     m_ui->instrumentComboBox->setEnabled(true);
     const QString model = QString::fromStdString(m_configuration->instrumentModel());
     if (model.isEmpty()) {
