@@ -27,13 +27,19 @@
 #include "host/store/EntryObjectFetch.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObjectResponse.h"
+#include "host/store/CommandDispatcher.h"
 #include "host/store/HostMetaTypes.h"
+#include "host/store/MarloModel.h"
+#include "host/store/Progress.h"
+#include "host/store/QtCommand.h"
+#include "host/store/UpdateObject.h"
 #include "host/widgets/ImageRepository.h"
 #include "host/widgets/ObjectBrowserDialog.h"
 #include "host/widgets/QGraphicsItemLayer.h"
 #include "host/widgets/SelectedPath.h"
 #include "host/widgets/TagDefinitionDialog.h"
 #include "host/widgets/UIHelper.h"
+#include "measurement/MeasurementConfigurationDialog.h"
 #include "model/QCJobTemplateModel.h"
 #include "plugin/PellamSettingsKeys.h"
 
@@ -654,6 +660,7 @@ void QCJobTemplateDetailWidget::setSchematicControlsEnabled(bool on)
     m_ui->schematicGraphicsView->resetBand();
 }
 
+<<<<<<< HEAD
 void QCJobTemplateDetailWidget::showStoredSchematic()
 {
     clearSchematicScene();
@@ -680,6 +687,66 @@ void QCJobTemplateDetailWidget::showStoredSchematic()
     m_ui->schematicNameLabel->setText(name);
     m_ui->schematicNameLabel->setToolTip(name);
 }
+=======
+void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::on_cropSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::on_fitToWindowButton_clicked() {}
+void QCJobTemplateDetailWidget::on_resetZoomButton_clicked() {}
+void QCJobTemplateDetailWidget::on_clearSchematicButton_clicked() {}
+void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int) {}
+// The configuration is stored at once, apart from the template, which the
+// user saves from the browser; the template refers to it from now on.
+void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked()
+{
+    MeasurementConfigurationDialog dialog(m_store, m_generalSettings, this);
+    if (dialog.exec() != QDialog::Accepted)
+        return;
+    const auto configuration = dialog.measurementConfiguration();
+    if (!configuration) {
+        m_ui->MeasConfigurationNameLabel->setText(QString());
+        m_ui->needMeasureConfigNotice->show();
+        m_ui->tabWidget->setCurrentIndex(2);
+        return;
+    }
+    storeMeasurementConfiguration(configuration);
+    m_model->setMeasurementConfiguration(configuration);
+    m_ui->MeasConfigurationNameLabel->setText(QString::fromStdString(configuration->name()));
+    emit sgJobTemplateWasModified(m_model->jobTemplate());
+    m_ui->needMeasureConfigNotice->hide();
+}
+
+void QCJobTemplateDetailWidget::storeMeasurementConfiguration(const std::shared_ptr<MeasurementConfiguration>& configuration)
+{
+    auto command = std::make_shared<UpdateObject>();
+    command->setObject(configuration);
+    // A configuration whose folder entry is gone is filed again at the top
+    // level, so that it stays listed; one still filed keeps its folder.
+    command->setFolderId(std::string());
+    auto wrapper = std::make_shared<QtCommand>(command);
+    connect(wrapper.get(), &QtCommand::responseReceived, this, &QCJobTemplateDetailWidget::onSavedMc);
+    connect(wrapper.get(), &QtCommand::errorReceived, this, &QCJobTemplateDetailWidget::onSaveError);
+    connect(wrapper.get(), &QtCommand::progressReceived, this,
+            [this](const std::shared_ptr<Progress>&) { onSaveProgress(nullptr); });
+    if (const auto dispatcher = m_store.commandDispatcher(std::string()))
+        dispatcher->dispatch(wrapper);
+    else
+        onSaveError(std::make_shared<ErrorInfo>(tr("there is no default store.")));
+}
+
+// The editor does not wait for the store: the template took the
+// configuration when the command was sent.
+void QCJobTemplateDetailWidget::onSavedMc(std::shared_ptr<vemi::Response>) {}
+void QCJobTemplateDetailWidget::onSaveProgress(std::shared_ptr<vemi::Response>) {}
+
+void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo> errorInfo)
+{
+    QMessageBox box(QMessageBox::Information, QStringLiteral("Not ok"),
+                    QStringLiteral("Unable to save: ") + (errorInfo ? errorInfo->message() : QString()));
+    box.exec();
+}
+void QCJobTemplateDetailWidget::on_zoomInButton_clicked() {}
+void QCJobTemplateDetailWidget::on_zoomOutButton_clicked() {}
+>>>>>>> wt-measure
 
 void QCJobTemplateDetailWidget::showSchematicMessage(const QString& text)
 {

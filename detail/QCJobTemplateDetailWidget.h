@@ -25,6 +25,7 @@ class GeneralSettings;
 class GlobalDirEntry;
 class Instrument;
 class MarloModel;
+class MeasurementConfiguration;
 class ObjectBrowserDialog;
 class QCJobTemplate;
 class QGraphicsItemLayer;
@@ -139,6 +140,8 @@ private:
     void addCheckPointToSchematic(int cpIndex, int coupletId, QRect rect);
     void refreshCheckPointLayer();
     void showTemplateName(const QString& name);
+    // Sends the UpdateObject; its answer comes to onSavedMc or onSaveError.
+    void storeMeasurementConfiguration(const std::shared_ptr<MeasurementConfiguration>& configuration);
 
     MarloModel& m_store;
     std::shared_ptr<QCJobTemplateModel> m_model;

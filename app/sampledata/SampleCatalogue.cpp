@@ -29,7 +29,9 @@
 #include <QImage>
 #include <QRect>
 
+#include <initializer_list>
 #include <map>
+#include <utility>
 
 namespace vemi {
 
@@ -131,16 +133,36 @@ const std::array<TolerancePlan, 3> kOtherTolerances = {{
     {"Printed Labels", "Acceptance limit for printed warning and information labels.", "dE*ab", 3.0, "D50", "2"},
 }};
 
-std::shared_ptr<MeasurementConfiguration> makeMeasurementConfiguration()
+// Configurations of the simulated instruments, listing every setting of the
+// instrument's conditions in their order.
+std::shared_ptr<MeasurementConfiguration> makeMeasurementConfiguration(
+    const char* name, const char* description, const char* instrumentModel,
+    std::initializer_list<std::pair<const char*, const char*>> settings)
 {
     auto configuration = std::make_shared<MeasurementConfiguration>();
-    configuration->setName("Sphere d/8 D65/10");
-    configuration->setDescription("Sphere geometry, large area view, evaluated for D65 and the 10 degree observer.");
-    configuration->setInstrumentModel("Simulated Sphere Spectrophotometer");
-    configuration->setProperties({std::make_shared<Property>("Illuminant", "D65"),
-                                  std::make_shared<Property>("Observer", "10"),
-                                  std::make_shared<Property>("Aperture", "LAV")});
+    configuration->setName(name);
+    configuration->setDescription(description);
+    configuration->setInstrumentModel(instrumentModel);
+    std::vector<std::shared_ptr<Property>> properties;
+    for (const auto& [key, value] : settings)
+        properties.push_back(std::make_shared<Property>(key, value));
+    configuration->setProperties(properties);
     return configuration;
+}
+
+std::vector<std::shared_ptr<MeasurementConfiguration>> makeMeasurementConfigurations()
+{
+    return {makeMeasurementConfiguration(
+                "Sphere d/8 D65/10",
+                "Sphere geometry, specular included, 12 mm aperture, evaluated for D65 and the 10 degree observer.",
+                "simcolorsphere",
+                {{"Illuminant", "D65"}, {"Observer", "10"}, {"Specular Component", "Included"},
+                 {"Aperture", "12 mm"}, {"UV Filter", "Off"}}),
+            makeMeasurementConfiguration(
+                "45/0 D65/10 Small Area",
+                "45/0 geometry with the 4 mm aperture for narrow trim parts, evaluated for D65 and the 10 degree "
+                "observer.",
+                "simcolor45", {{"Illuminant", "D65"}, {"Observer", "10"}, {"Aperture", "4 mm"}})};
 }
 
 // --- Job templates --------------------------------------------------------
@@ -166,6 +188,7 @@ struct TemplatePlan
     std::array<const char*, 3> tagValues; // Supplier, Part Number, Material
     std::vector<Spot> spots;
     std::size_t coupleFirst; // this spot and the next are measured as the couple "A"
+    std::size_t configuration; // index into the sample configurations
 };
 
 const std::vector<TemplatePlan>& templatePlans()
@@ -184,7 +207,8 @@ const std::vector<TemplatePlan>& templatePlans()
           {"Fabric Insert", QRect(275, 232, 50, 50), OceanBlue, true},
           {"Armrest", QRect(540, 266, 50, 50), GraphiteGrey, false},
           {"Map Pocket", QRect(300, 425, 50, 50), GraphiteGrey, true}},
-         3},
+         3,
+         0},
         {"Dashboard Fascia",
          "Colour check of the instrument panel fascia. The left and right decor strips are measured as "
          "a pair to catch shade differences from side to side.",
@@ -197,6 +221,7 @@ const std::vector<TemplatePlan>& templatePlans()
           {"Decor Strip Left", QRect(200, 344, 30, 30), SignalRed, false},
           {"Decor Strip Right", QRect(690, 344, 30, 30), SignalRed, false},
           {"Glovebox Lid", QRect(620, 262, 45, 45), IvoryBeige, true}},
+         1,
          1},
     };
     return plans;
@@ -298,7 +323,7 @@ std::shared_ptr<QCJobTemplate> makeTemplate(const TemplatePlan& plan, const Samp
     addTags(*jobTemplate, plan, samples);
     const StandardCopies copies = addStandards(*jobTemplate, plan, samples);
     jobTemplate->setSharedToleranceSets({ObjectCodec::clone(*samples.toleranceSet)});
-    jobTemplate->setMeasurementConfiguration(ObjectCodec::clone(*samples.configuration));
+    jobTemplate->setMeasurementConfiguration(ObjectCodec::clone(*samples.configurations.at(plan.configuration)));
 
     const QImage drawing = plan.draw(samples.colours);
     jobTemplate->setSchematicImage(makeSchematic(plan, drawing));
@@ -325,7 +350,7 @@ SampleCatalogue::Samples SampleCatalogue::samples(const LabToScreen& d65ToScreen
     samples.toleranceSet = makeToleranceSet(kInteriorTolerance);
     for (const TolerancePlan& plan : kOtherTolerances)
         samples.otherToleranceSets.push_back(makeToleranceSet(plan));
-    samples.configuration = makeMeasurementConfiguration();
+    samples.configurations = makeMeasurementConfigurations();
     return samples;
 }
 

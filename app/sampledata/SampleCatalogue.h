@@ -34,7 +34,8 @@ public:
         std::vector<std::shared_ptr<TagDefinition>> inspectionDefinitions;
         std::shared_ptr<ToleranceSet> toleranceSet; // the templates' default tolerance
         std::vector<std::shared_ptr<ToleranceSet>> otherToleranceSets;
-        std::shared_ptr<MeasurementConfiguration> configuration;
+        // Configurations of the simulated instruments; the templates carry copies.
+        std::vector<std::shared_ptr<MeasurementConfiguration>> configurations;
     };
 
     // d65ToScreen and d50ToScreen convert the Lab values of the interior

@@ -43,12 +43,6 @@ void addAll(FillEmptyStore& set, const char* folderName, const std::vector<std::
     addAll(set, Object::typeId(), folderName, objects);
 }
 
-template <class Object>
-void addOne(FillEmptyStore& set, const char* folderName, const std::shared_ptr<Object>& object)
-{
-    addAll(set, folderName, std::vector<std::shared_ptr<Object>>{object});
-}
-
 } // namespace
 
 std::shared_ptr<FillEmptyStore> SampleData::buildSet(QString* error)
@@ -71,7 +65,7 @@ std::shared_ptr<FillEmptyStore> SampleData::buildSet(QString* error)
     addAll(*set, kSamplesFolder, definitions);
     addAll(*set, kSamplesFolder, SampleCatalogue::propertyLibraries(samples));
     addAll(*set, kSamplesFolder, SampleCatalogue::toleranceSets(samples));
-    addOne(*set, kSamplesFolder, samples.configuration);
+    addAll(*set, kSamplesFolder, samples.configurations);
     addAll(*set, QCJobTemplate::typeId(), kTemplatesFolder, SampleCatalogue::jobTemplates(samples));
     return set;
 }

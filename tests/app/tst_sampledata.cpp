@@ -20,7 +20,15 @@
 #include "host/store/GetMarloObjectsResponse.h"
 #include "host/domain/LabToleranceBase.h"
 #include "host/domain/LabValue.h"
+#include "host/client/BaseSetting.h"
+#include "host/client/SettingsGroup.h"
+#include "host/client/SettingsList.h"
+#include "host/client/SettingsSection.h"
 #include "host/domain/MeasurementConfiguration.h"
+#include "host/domain/Property.h"
+#include "host/instruments/Instrument.h"
+#include "host/instruments/InstrumentManager.h"
+#include "host/instruments/MeasurementConditions.h"
 #include "host/domain/Position.h"
 #include "host/domain/PropertyLibrary.h"
 #include "host/domain/QCJobTemplate.h"
@@ -138,6 +146,7 @@ private slots:
     void fillsEachTreeInItsFolders();
     void templatesAreComplete_data();
     void templatesAreComplete();
+    void configurationsFitTheirInstruments();
     void librariesResolveTheirMembers_data();
     void librariesResolveTheirMembers();
     void displayColoursFollowLab_data();
@@ -178,8 +187,8 @@ void tst_SampleData::fillsEachTreeInItsFolders_data()
     QTest::newRow("property libraries") << QString::fromStdString(PropertyLibrary::typeId()) << QStringList{"Samples"}
                                         << 2;
     QTest::newRow("tolerance sets") << QString::fromStdString(ToleranceSet::typeId()) << QStringList{"Samples"} << 4;
-    QTest::newRow("measurement configuration")
-        << QString::fromStdString(MeasurementConfiguration::typeId()) << QStringList{"Samples"} << 1;
+    QTest::newRow("measurement configurations")
+        << QString::fromStdString(MeasurementConfiguration::typeId()) << QStringList{"Samples"} << 2;
 }
 
 void tst_SampleData::fillsEachTreeInItsFolders()
@@ -283,6 +292,39 @@ void tst_SampleData::templatesAreComplete()
         QCOMPARE(couple->checkPoints()[1]->matchPoint(), std::string("<CP2>"));
     }
     QCOMPARE(couples, 1);
+}
+
+// The dialog lists the stored configurations and edits them with their
+// instrument's conditions: each must name an installed driver and list every
+// setting of it, in the instrument's order, with a value it offers.
+void tst_SampleData::configurationsFitTheirInstruments()
+{
+    const auto configurations = fetchAll<MeasurementConfiguration>(*m_seeded);
+    std::set<std::string> storedIds;
+    std::set<std::string> models;
+    for (const auto& configuration : configurations) {
+        storedIds.insert(configuration->id());
+        models.insert(configuration->instrumentModel());
+        const auto instrument =
+            InstrumentManager::instance()->instrument(QString::fromStdString(configuration->instrumentModel()));
+        QVERIFY2(instrument, configuration->name().c_str());
+        const auto conditions = instrument->measurementConditions();
+        QStringList keys;
+        for (const auto& property : configuration->properties()) {
+            keys << QString::fromStdString(property->key());
+            QVERIFY(conditions->allowedValues(keys.last()).contains(QString::fromStdString(property->value())));
+        }
+        QStringList settings;
+        for (const auto& group : conditions->settings()->groups())
+            for (const auto& section : group->sections())
+                for (const auto& setting : section->settings())
+                    settings << QString::fromStdString(setting->name());
+        QCOMPARE(keys, settings);
+    }
+    QCOMPARE(int(models.size()), 2);
+    // Each template carries a copy of a stored configuration, under its id.
+    for (const auto& jobTemplate : fetchAll<QCJobTemplate>(*m_seeded))
+        QVERIFY(storedIds.count(jobTemplate->measurementConfiguration()->id()));
 }
 
 void tst_SampleData::librariesResolveTheirMembers_data()
