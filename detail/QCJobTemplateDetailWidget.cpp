@@ -610,14 +610,6 @@ void QCJobTemplateDetailWidget::onPropertyLibraryLoaded(std::shared_ptr<Response
     emitModified();
 }
 
-// --- Measurement configuration: its behaviour is not part of this editor
-// yet; the controls exist so the form is complete.
-
-void QCJobTemplateDetailWidget::onSavedMc(std::shared_ptr<vemi::Response>) {}
-void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo>) {}
-void QCJobTemplateDetailWidget::onSaveProgress(std::shared_ptr<vemi::Response>) {}
-void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked() {}
-
 // Instrument events need no action in the template editor.
 void QCJobTemplateDetailWidget::onInstrumentConnected(std::shared_ptr<vemi::Instrument>) {}
 void QCJobTemplateDetailWidget::onInstrumentDisconnected(std::shared_ptr<vemi::Instrument>) {}
@@ -660,7 +652,6 @@ void QCJobTemplateDetailWidget::setSchematicControlsEnabled(bool on)
     m_ui->schematicGraphicsView->resetBand();
 }
 
-<<<<<<< HEAD
 void QCJobTemplateDetailWidget::showStoredSchematic()
 {
     clearSchematicScene();
@@ -687,13 +678,7 @@ void QCJobTemplateDetailWidget::showStoredSchematic()
     m_ui->schematicNameLabel->setText(name);
     m_ui->schematicNameLabel->setToolTip(name);
 }
-=======
-void QCJobTemplateDetailWidget::on_browseSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::on_cropSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::on_fitToWindowButton_clicked() {}
-void QCJobTemplateDetailWidget::on_resetZoomButton_clicked() {}
-void QCJobTemplateDetailWidget::on_clearSchematicButton_clicked() {}
-void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int) {}
+
 // The configuration is stored at once, apart from the template, which the
 // user saves from the browser; the template refers to it from now on.
 void QCJobTemplateDetailWidget::on_addMeasurementConfigurationButton_clicked()
@@ -744,9 +729,6 @@ void QCJobTemplateDetailWidget::onSaveError(std::shared_ptr<vemi::ErrorInfo> err
                     QStringLiteral("Unable to save: ") + (errorInfo ? errorInfo->message() : QString()));
     box.exec();
 }
-void QCJobTemplateDetailWidget::on_zoomInButton_clicked() {}
-void QCJobTemplateDetailWidget::on_zoomOutButton_clicked() {}
->>>>>>> wt-measure
 
 void QCJobTemplateDetailWidget::showSchematicMessage(const QString& text)
 {

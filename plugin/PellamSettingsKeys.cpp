@@ -6,11 +6,8 @@ namespace PellamKeys {
 const QString MainSplitterState = QStringLiteral("UI/Pellam/mainSplitterState");
 const QString HorizontalSplitterState = QStringLiteral("UI/Pellam/horizontalSplitterState");
 const QString QcJobTemplateSplitterState = QStringLiteral("UI/Pellam/qcJobTemplateSplitterState");
-<<<<<<< HEAD
 const QString SchematicImagePath = QStringLiteral("UI/Pellam/SchematicImagePath");
-=======
 const QString DialogSplitterState = QStringLiteral("UI/Pellam/dialogSplitterState");
->>>>>>> wt-measure
 
 const QString LibraryPathGroup = QStringLiteral("Opal QC/LibraryPath");
 const QString StandardPathGroup = QStringLiteral("Opal QC/StandardPath");

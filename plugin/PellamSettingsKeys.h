@@ -10,12 +10,9 @@ namespace PellamKeys {
 extern const QString MainSplitterState;
 extern const QString HorizontalSplitterState;
 extern const QString QcJobTemplateSplitterState;
-<<<<<<< HEAD
 // The schematic file chosen last; the next file dialog starts beside it.
 extern const QString SchematicImagePath;
-=======
 extern const QString DialogSplitterState;
->>>>>>> wt-measure
 
 // Groups of the pickers' remembered positions, each holding the two keys below.
 extern const QString LibraryPathGroup;
