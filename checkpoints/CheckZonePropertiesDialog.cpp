@@ -18,6 +18,8 @@
 
 #include <QEvent>
 
+#include <algorithm>
+
 using vemi::ObjectPicker;
 using vemi::PropertyList;
 

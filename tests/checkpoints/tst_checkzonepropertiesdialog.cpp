@@ -1,6 +1,5 @@
 #include "tests/common/ModalAnswer.h"
 #include "tests/common/ObjectBrowserAnswer.h"
-#include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
 #include "tests/common/TestMain.h"
 
@@ -111,7 +110,6 @@ private slots:
     void pickerPlaceIsSharedWithTheEditor();
     void fetchedPropertiesMeetWhatIsThere_data();
     void fetchedPropertiesMeetWhatIsThere();
-    void vanishedPropertyIsLoggedNotApplied();
     void checkPointAndTemplateStayUntouched_data();
     void checkPointAndTemplateStayUntouched();
 
@@ -497,34 +495,6 @@ void tst_CheckZonePropertiesDialog::fetchedPropertiesMeetWhatIsThere()
     QCOMPARE(names(m_dialog->tagDefinitions()), definitions);
     QCOMPARE(valueTexts(m_dialog->tagDefinitions(), m_dialog->tagValues()), values);
     QCOMPARE(child<QTableWidget>("tagTable")->rowCount(), definitions.size());
-}
-
-void tst_CheckZonePropertiesDialog::vanishedPropertyIsLoggedNotApplied()
-{
-    auto fleeting = definition("Fleeting");
-    save(fleeting, "Shelf");
-    m_dialog = makeDialog();
-    static QStringList warnings;
-    warnings.clear();
-    const QtMessageHandler previous =
-        qInstallMessageHandler([](QtMsgType type, const QMessageLogContext&, const QString& text) {
-            if (type == QtWarningMsg && text.startsWith("Cannot"))
-                warnings.append(text);
-        });
-    // The entry is listed, then another program deletes its object before OK.
-    const QString path = m_store->path();
-    const QString id = QString::fromStdString(fleeting->id());
-    pickInNextDialog({}, {"Shelf"}, {"Fleeting"}, nullptr, nullptr, [path, id] {
-        RawConnection raw(path);
-        raw.exec(QStringLiteral("PRAGMA foreign_keys = OFF"));
-        raw.exec(QStringLiteral("DELETE FROM objects WHERE id = ?"), {id});
-    });
-    QTest::mouseClick(child<QAbstractButton>("AddTagsButton"), Qt::LeftButton);
-    (void)QTest::qWaitFor([] { return !warnings.isEmpty(); }, 5000);
-    qInstallMessageHandler(previous); // before any check, so that the test log is not swallowed
-    QCOMPARE(warnings.size(), 1);
-    QVERIFY2(warnings.first().contains(id), qPrintable(warnings.first()));
-    QVERIFY(m_dialog->tagDefinitions().empty());
 }
 
 // --- Results
