@@ -1,4 +1,7 @@
 #include "detail/QCJobTemplateDetailWidget.h"
+#include "detail/ObjectPicker.h"
+#include "detail/PropertyList.h"
+#include "detail/StandardIcon.h"
 #include "ui_QCJobTemplateDetailWidget.h"
 
 #include "checkpoints/CheckZoneEditor.h"
@@ -11,7 +14,6 @@
 #include "host/domain/AppearanceValues.h"
 #include "host/domain/ColorStandardsLibrary.h"
 #include "host/domain/ColorimetricCondition.h"
-#include "host/domain/GlobalDirEntry.h"
 #include "host/domain/LabToleranceBase.h"
 #include "host/domain/LabValue.h"
 #include "host/domain/MeasurementConfiguration.h"
@@ -24,7 +26,6 @@
 #include "host/domain/TagValue.h"
 #include "host/domain/ToleranceSet.h"
 #include "host/instruments/InstrumentManager.h"
-#include "host/store/EntryObjectFetch.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObjectResponse.h"
 #include "host/store/CommandDispatcher.h"
@@ -34,11 +35,8 @@
 #include "host/store/QtCommand.h"
 #include "host/store/UpdateObject.h"
 #include "host/widgets/ImageRepository.h"
-#include "host/widgets/ObjectBrowserDialog.h"
 #include "host/widgets/QGraphicsItemLayer.h"
 #include "host/widgets/SelectedPath.h"
-#include "host/widgets/TagDefinitionDialog.h"
-#include "host/widgets/UIHelper.h"
 #include "measurement/MeasurementConfigurationDialog.h"
 #include "model/QCJobTemplateModel.h"
 #include "plugin/PellamSettingsKeys.h"
@@ -57,44 +55,14 @@
 #include <QStandardPaths>
 
 #include <algorithm>
-#include <functional>
 
 namespace vemi {
 
 namespace {
 
-// The object of a fetch answer when it is of the expected type, else null.
-template <class T>
-std::shared_ptr<T> objectOfType(const std::shared_ptr<Response>& response)
-{
-    const auto answer = std::dynamic_pointer_cast<GetMarloObjectResponse>(response);
-    const auto object = answer ? answer->object() : nullptr;
-    if (!object || object->objectTypeId() != T::typeId())
-        return nullptr;
-    return std::dynamic_pointer_cast<T>(object);
-}
-
 bool isFetchAnswer(const std::shared_ptr<Response>& response)
 {
     return std::dynamic_pointer_cast<GetMarloObjectResponse>(response) != nullptr;
-}
-
-bool hasDefinitionNamed(const std::vector<std::shared_ptr<TagDefinition>>& definitions, const std::string& name)
-{
-    return std::any_of(definitions.begin(), definitions.end(),
-                       [&name](const std::shared_ptr<TagDefinition>& d) { return d && d->name() == name; });
-}
-
-QIcon standardIcon(const QIcon& base, const Standard& standard)
-{
-    QIcon icon = base;
-    if (const auto rgb = standard.displayRGB()) {
-        QPixmap swatch(10, 10);
-        swatch.fill(UIHelper::toColor(*rgb));
-        icon.addPixmap(swatch, QIcon::Normal, QIcon::Off);
-        icon.addPixmap(swatch, QIcon::Selected, QIcon::Off);
-    }
-    return icon;
 }
 
 // A stored schematic of this many bytes or fewer counts as no picture.
@@ -194,10 +162,10 @@ QCJobTemplateDetailWidget::QCJobTemplateDetailWidget(MarloModel& store, QWidget*
 
     m_ui->checkZoneEditor->init(m_store, m_model);
 
-    m_tolerancePath = loadSelectedPath(PellamKeys::TolerancePathGroup);
-    m_libraryPath = loadSelectedPath(PellamKeys::LibraryPathGroup);
-    m_standardPath = loadSelectedPath(PellamKeys::StandardPathGroup);
-    m_propertyPath = loadSelectedPath(PellamKeys::PropertyPathGroup);
+    m_tolerancePath = ObjectPicker::loadPosition(PellamKeys::TolerancePathGroup);
+    m_libraryPath = ObjectPicker::loadPosition(PellamKeys::LibraryPathGroup);
+    m_standardPath = ObjectPicker::loadPosition(PellamKeys::StandardPathGroup);
+    m_propertyPath = ObjectPicker::loadPosition(PellamKeys::PropertyPathGroup);
 
     for (QWidget* button : {m_ui->cropSchematicButton, m_ui->resetZoomButton, m_ui->fitToWindowButton,
                             m_ui->zoomInButton, m_ui->zoomOutButton})
@@ -307,7 +275,7 @@ void QCJobTemplateDetailWidget::fillStandardsList()
     for (const auto& standard : standards) {
         if (!standard)
             continue;
-        auto* item = new QListWidgetItem(standardIcon(base, *standard), QString::fromStdString(standard->name()));
+        auto* item = new QListWidgetItem(StandardIcon::of(base, *standard), QString::fromStdString(standard->name()));
         item->setData(Qt::UserRole, QVariant::fromValue(std::shared_ptr<BaseObject>(standard)));
         m_ui->standardsListWidget->addItem(item);
     }
@@ -351,32 +319,11 @@ void QCJobTemplateDetailWidget::tagRowsSelected(int index, QStringList)
     m_ui->removeTag->setEnabled(index >= 0);
 }
 
-// The values are not indexed like the definitions (a definition without a
-// default adds no value), so each removed definition takes the values that
-// name it, wherever they stand.
 void QCJobTemplateDetailWidget::on_removeTag_clicked()
 {
-    std::vector<int> rows = m_ui->tagDisplayWidget->getSelectedRows();
-    if (!rows.empty()) {
-        std::sort(rows.begin(), rows.end(), std::greater<int>());
-        auto definitions = m_model->tagDefinitions();
-        auto values = m_model->tagValues();
-        for (int row : rows) {
-            if (row < 0 || row >= int(definitions.size()))
-                continue;
-            const std::string id = definitions[std::size_t(row)] ? definitions[std::size_t(row)]->id() : std::string();
-            definitions.erase(definitions.begin() + row);
-            values.erase(std::remove_if(values.begin(), values.end(),
-                                        [&id](const std::shared_ptr<TagValue>& v) {
-                                            return v && v->definitionId() == id;
-                                        }),
-                         values.end());
-        }
-        m_model->setTagDefinitions(definitions);
-        m_model->setTagValues(values);
-        m_ui->tagDisplayWidget->setTags(values, definitions);
-        emitModified();
-    }
+    PropertyList properties(m_model->tagDefinitions(), m_model->tagValues());
+    if (properties.removeRows(m_ui->tagDisplayWidget->getSelectedRows()))
+        storeProperties(properties);
     m_ui->removeTag->setEnabled(false);
     m_ui->tagDisplayWidget->clearSelections();
 }
@@ -384,17 +331,18 @@ void QCJobTemplateDetailWidget::on_removeTag_clicked()
 void QCJobTemplateDetailWidget::tagEditSelected(int index, std::string)
 {
     m_ui->removeTag->setEnabled(false);
-    const auto definitions = m_model->tagDefinitions();
-    if (index >= 0 && index < int(definitions.size())) {
-        auto values = m_model->tagValues();
-        TagDefinitionDialog dialog(this);
-        if (dialog.edit(m_store, values, definitions[std::size_t(index)])) {
-            m_model->setTagValues(values);
-            m_ui->tagDisplayWidget->setTags(values, definitions);
-            emitModified();
-        }
-    }
+    PropertyList properties(m_model->tagDefinitions(), m_model->tagValues());
+    if (properties.editRow(index, m_store, this))
+        storeProperties(properties);
     m_ui->tagDisplayWidget->clearSelections();
+}
+
+void QCJobTemplateDetailWidget::storeProperties(const PropertyList& properties)
+{
+    m_model->setTagDefinitions(properties.definitions());
+    m_model->setTagValues(properties.values());
+    m_ui->tagDisplayWidget->setTags(properties.values(), properties.definitions());
+    emitModified();
 }
 
 bool QCJobTemplateDetailWidget::findConditionMismatch(const std::shared_ptr<ToleranceSet>& set,
@@ -430,7 +378,7 @@ void QCJobTemplateDetailWidget::onNewToleranceLoaded(std::shared_ptr<Response> r
 {
     if (!isFetchAnswer(response))
         return;
-    const auto set = objectOfType<ToleranceSet>(response);
+    const auto set = ObjectPicker::answerObject<ToleranceSet>(response);
     if (!set) {
         fillToleranceList();
         return;
@@ -484,72 +432,32 @@ void QCJobTemplateDetailWidget::on_insertToleranceButton_clicked()
 
 void QCJobTemplateDetailWidget::runPicker(const Picker& picker)
 {
-    ObjectBrowserDialog dialog(m_store, this);
-    dialog.initialize(true, false, {picker.typeId}, tr(picker.title), false);
-    dialog.setDispatcherList(m_generalSettings ? m_generalSettings->dispatcherList() : std::vector<std::string>());
-    dialog.setLastSelectedPath(*picker.position);
-    if (dialog.exec() != QDialog::Accepted)
-        return;
-    *picker.position = dialog.lastSelectedPath();
-    saveSelectedPaths();
-    const auto entries = dialog.selectedDirEntries();
-    for (const auto& entry : entries) {
-        if (entry)
-            fetchEntry(*entry, picker.depth, picker.onResponse);
-        if (picker.firstEntryOnly)
-            break;
-    }
-}
-
-// The entry names its own store, so an object chosen in another store is
-// fetched from there. A failed fetch changes nothing; its cause is logged.
-void QCJobTemplateDetailWidget::fetchEntry(const GlobalDirEntry& entry, int depth, ResponseSlot onResponse)
-{
-    EntryObjectFetch::fetch(
-        m_store, entry, std::string(), this,
-        [this, onResponse](const std::shared_ptr<BaseObject>& object) {
-            (this->*onResponse)(std::make_shared<GetMarloObjectResponse>(object));
-        },
-        [](const std::shared_ptr<ErrorInfo>& error) {
-            qWarning("%s", qPrintable(error ? error->message() : QStringLiteral("Cannot fetch an object.")));
-        },
-        depth > 0 ? depth : 1);
-}
-
-std::shared_ptr<SelectedPath> QCJobTemplateDetailWidget::loadSelectedPath(const QString& group)
-{
-    QSettings settings;
-    settings.beginGroup(group);
-    const QString path = settings.value(PellamKeys::LastSelectedPath).toString();
-    const QString dispatcherId = settings.value(PellamKeys::DispatcherId).toString();
-    settings.endGroup();
-    return std::make_shared<SelectedPath>(dispatcherId.toStdString(), SelectedPath::pathFromString(path.toStdString()));
+    ObjectPicker::Request request;
+    request.title = tr(picker.title);
+    request.typeId = picker.typeId;
+    request.firstEntryOnly = picker.firstEntryOnly;
+    request.depth = picker.depth;
+    if (m_generalSettings)
+        request.dispatchers = m_generalSettings->dispatcherList();
+    const ResponseSlot onResponse = picker.onResponse;
+    ObjectPicker::run(
+        m_store, this, request, *picker.position, [this] { saveSelectedPaths(); }, this,
+        [this, onResponse](const std::shared_ptr<Response>& answer) { (this->*onResponse)(answer); });
 }
 
 void QCJobTemplateDetailWidget::saveSelectedPaths() const
 {
-    const std::pair<const QString&, const std::shared_ptr<SelectedPath>&> positions[] = {
-        {PellamKeys::LibraryPathGroup, m_libraryPath},
-        {PellamKeys::StandardPathGroup, m_standardPath},
-        {PellamKeys::TolerancePathGroup, m_tolerancePath},
-        {PellamKeys::PropertyPathGroup, m_propertyPath}};
-    QSettings settings;
-    for (const auto& [group, position] : positions) {
-        if (!position)
-            continue;
-        settings.beginGroup(group);
-        settings.setValue(PellamKeys::LastSelectedPath,
-                          QString::fromStdString(SelectedPath::pathToString(position->path())));
-        settings.setValue(PellamKeys::DispatcherId, QString::fromStdString(position->dispatcherId()));
-        settings.endGroup();
-    }
+    ObjectPicker::savePosition(PellamKeys::LibraryPathGroup, m_libraryPath);
+    ObjectPicker::savePosition(PellamKeys::StandardPathGroup, m_standardPath);
+    ObjectPicker::savePosition(PellamKeys::TolerancePathGroup, m_tolerancePath);
+    ObjectPicker::savePosition(PellamKeys::PropertyPathGroup, m_propertyPath);
 }
 
 void QCJobTemplateDetailWidget::onNewStandardLoaded(std::shared_ptr<Response> response)
 {
     if (!isFetchAnswer(response))
         return;
-    if (const auto standard = objectOfType<Standard>(response)) {
+    if (const auto standard = ObjectPicker::answerObject<Standard>(response)) {
         const auto standards = m_model->standards();
         const bool known = std::any_of(standards.begin(), standards.end(), [&standard](const auto& s) {
             return s && s->name() == standard->name();
@@ -565,7 +473,7 @@ void QCJobTemplateDetailWidget::onColorLibraryLoaded(std::shared_ptr<Response> r
 {
     if (!isFetchAnswer(response))
         return;
-    if (const auto library = objectOfType<ColorStandardsLibrary>(response)) {
+    if (const auto library = ObjectPicker::answerObject<ColorStandardsLibrary>(response)) {
         m_model->setStandardsFromLibrary(library);
         emitModified();
     }
@@ -574,39 +482,22 @@ void QCJobTemplateDetailWidget::onColorLibraryLoaded(std::shared_ptr<Response> r
 
 void QCJobTemplateDetailWidget::onPropertyLoaded(std::shared_ptr<Response> response)
 {
-    const auto definition = objectOfType<TagDefinition>(response);
-    if (!definition)
-        return;
-    auto definitions = m_model->tagDefinitions();
-    auto values = m_model->tagValues();
-    if (hasDefinitionNamed(definitions, definition->name()))
-        return;
-    definitions.push_back(definition);
-    if (!definition->defaultValue().empty())
-        values.push_back(TagValue::forDefinition(*definition, definition->defaultValue()));
-    m_model->setTagDefinitions(definitions);
-    m_model->setTagValues(values);
-    m_ui->tagDisplayWidget->setTags(values, definitions);
-    emitModified();
+    PropertyList properties(m_model->tagDefinitions(), m_model->tagValues());
+    if (properties.add(ObjectPicker::answerObject<TagDefinition>(response)))
+        storeProperties(properties);
 }
 
 void QCJobTemplateDetailWidget::onPropertyLibraryLoaded(std::shared_ptr<Response> response)
 {
-    const auto library = objectOfType<PropertyLibrary>(response);
+    const auto library = ObjectPicker::answerObject<PropertyLibrary>(response);
     if (!library)
         return;
-    for (const auto& property : library->properties()) {
-        auto definitions = m_model->tagDefinitions();
-        if (!property || hasDefinitionNamed(definitions, property->name()))
-            continue;
-        auto values = m_model->tagValues();
-        definitions.push_back(property);
-        if (!property->defaultValue().empty())
-            values.push_back(TagValue::forDefinition(*property, property->defaultValue()));
-        m_model->setTagDefinitions(definitions);
-        m_model->setTagValues(values);
-        m_ui->tagDisplayWidget->setTags(values, definitions);
-    }
+    PropertyList properties(m_model->tagDefinitions(), m_model->tagValues());
+    for (const auto& property : library->properties())
+        properties.add(property);
+    m_model->setTagDefinitions(properties.definitions());
+    m_model->setTagValues(properties.values());
+    m_ui->tagDisplayWidget->setTags(properties.values(), properties.definitions());
     emitModified();
 }
 

@@ -22,11 +22,10 @@ namespace vemi {
 
 class ErrorInfo;
 class GeneralSettings;
-class GlobalDirEntry;
 class Instrument;
 class MarloModel;
 class MeasurementConfiguration;
-class ObjectBrowserDialog;
+class PropertyList;
 class QCJobTemplate;
 class QGraphicsItemLayer;
 class Response;
@@ -117,9 +116,9 @@ private:
     void emitModified();
     // Runs one picker: the dialog, the remembered position, one fetch per entry.
     void runPicker(const Picker& picker);
-    void fetchEntry(const GlobalDirEntry& entry, int depth, ResponseSlot onResponse);
-    static std::shared_ptr<SelectedPath> loadSelectedPath(const QString& group);
     void saveSelectedPaths() const;
+    // Puts properties into the template, shows and announces them.
+    void storeProperties(const PropertyList& properties);
     void fillStandardsList();
     void fillToleranceList();
     // The name of the first standard whose colorimetric condition differs from

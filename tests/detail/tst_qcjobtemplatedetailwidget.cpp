@@ -1,4 +1,5 @@
 #include "tests/common/ModalAnswer.h"
+#include "tests/common/ObjectBrowserAnswer.h"
 #include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
 #include "tests/common/TestMain.h"
@@ -48,6 +49,7 @@
 Q_DECLARE_METATYPE(std::shared_ptr<vemi::QCJobTemplate>)
 
 using namespace vemi;
+using ObjectBrowserAnswer::pickInNextDialog;
 
 namespace {
 
@@ -171,9 +173,6 @@ private:
     // Stores object in the store named dispatcherId, in a new folder when folderName is given.
     std::string save(std::shared_ptr<NamedObject> object, const std::string& folderName = {},
                      const std::string& dispatcherId = {});
-    static void pickInNextDialog(QString store, QStringList path, QStringList entries, QString* title = nullptr,
-                                 std::shared_ptr<SelectedPath>* openedAt = nullptr,
-                                 std::function<void()> beforeOk = {});
 
     std::unique_ptr<TempStore> m_store;
     std::shared_ptr<QCJobTemplateModel> m_model;
@@ -304,69 +303,6 @@ std::string tst_QCJobTemplateDetailWidget::save(std::shared_ptr<NamedObject> obj
     if (!m_store->run(update, dispatcherId).response)
         qWarning("could not save %s", object->name().c_str());
     return object->id();
-}
-
-// Chooses store in the next object browser, opens the folders of path,
-// selects the entries there, runs beforeOk and presses OK; no entries cancel
-// the dialog instead. The dialog is closed in every case.
-void tst_QCJobTemplateDetailWidget::pickInNextDialog(QString store, QStringList path, QStringList entries, QString* title,
-                                                     std::shared_ptr<SelectedPath>* openedAt,
-                                                     std::function<void()> beforeOk)
-{
-    ModalAnswer::actOnNextModal([=](QWidget* modal) {
-        auto* dialog = qobject_cast<ObjectBrowserDialog*>(modal);
-        if (!dialog) {
-            modal->close();
-            QFAIL("expected an object browser");
-        }
-        if (title)
-            *title = dialog->windowTitle();
-        if (openedAt)
-            *openedAt = dialog->lastSelectedPath();
-        if (entries.isEmpty()) {
-            dialog->reject();
-            return;
-        }
-        if (!store.isEmpty()) {
-            auto* stores = dialog->findChild<QComboBox*>(QStringLiteral("dispatcherCombo"));
-            stores->setCurrentIndex(stores->findText(store));
-        }
-        auto* tree = dialog->findChild<QTreeView*>(QStringLiteral("folderTree"));
-        const auto find = [tree](const QModelIndex& parent, const QString& name) {
-            for (int row = 0; tree->model() && row < tree->model()->rowCount(parent); ++row) {
-                const QModelIndex index = tree->model()->index(row, 0, parent);
-                if (index.data().toString() == name)
-                    return index;
-            }
-            return QModelIndex();
-        };
-        const auto waitFor = [&](const QModelIndex& parent, const QString& name) {
-            (void)QTest::qWaitFor([&] { return find(parent, name).isValid(); }, 5000);
-            return find(parent, name);
-        };
-        QModelIndex folder;
-        for (const QString& name : path) {
-            folder = waitFor(folder, name);
-            tree->expand(folder);
-        }
-        tree->selectionModel()->clearSelection();
-        for (const QString& name : entries) {
-            const QModelIndex at = waitFor(folder, name);
-            if (!at.isValid()) {
-                dialog->reject();
-                QFAIL(qPrintable("the object browser does not list " + name));
-            }
-            tree->selectionModel()->select(at, QItemSelectionModel::Select | QItemSelectionModel::Rows);
-            tree->selectionModel()->setCurrentIndex(at, QItemSelectionModel::NoUpdate);
-        }
-        if (beforeOk)
-            beforeOk();
-        dialog->findChild<QDialogButtonBox*>(QStringLiteral("buttonBox"))->button(QDialogButtonBox::Ok)->click();
-        if (dialog->isVisible()) {
-            dialog->reject();
-            QFAIL("the object browser refused the choice");
-        }
-    });
 }
 
 // --- Structure, load and refresh
