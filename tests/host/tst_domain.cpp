@@ -1,4 +1,5 @@
 #include "tests/common/TestMain.h"
+#include "tests/common/TestLibrary.h"
 #include "host/domain/AppearanceValues.h"
 #include "host/domain/CheckPoint.h"
 #include "host/domain/CheckPointCouple.h"
@@ -200,14 +201,12 @@ class tst_Domain : public QObject
     Q_OBJECT
 
 private slots:
-    void populatedTemplateSurvivesRoundTrip();
+    void populatedTemplateKeepsItsValues();
     void everyClassSurvivesRoundTrip_data();
     void everyClassSurvivesRoundTrip();
-    void checkPointsFlattenCouplesInMemberOrder();
     void checkZoneIndex_data();
     void checkZoneIndex();
-    void appearanceValuesByIndex_data();
-    void appearanceValuesByIndex();
+    void appearanceValuesPastTheEndAreNull();
     void librariesStoreMemberIdsOnly_data();
     void librariesStoreMemberIdsOnly();
     void malformedBytesThrow_data();
@@ -216,16 +215,13 @@ private slots:
     void cloneSharesImageBytes();
 };
 
-void tst_Domain::populatedTemplateSurvivesRoundTrip()
+// The bytes of every class survive a round trip (below); this shows that the
+// values themselves are written, not only read back as they were written.
+void tst_Domain::populatedTemplateKeepsItsValues()
 {
     const auto original = makeTemplate();
-    const QByteArray bytes = ObjectCodec::serialize(*original);
-
-    const auto decoded = std::dynamic_pointer_cast<QCJobTemplate>(ObjectCodec::deserialize(bytes));
+    const auto decoded = std::dynamic_pointer_cast<QCJobTemplate>(ObjectCodec::deserialize(ObjectCodec::serialize(*original)));
     QVERIFY(decoded);
-    QCOMPARE(ObjectCodec::serialize(*decoded), bytes);
-
-    QCOMPARE(decoded->id(), original->id());
     QCOMPARE(decoded->name(), original->name());
     QCOMPARE(decoded->enableRepeat(), true);
     QCOMPARE(decoded->checkListItems().size(), std::size_t(3));
@@ -243,19 +239,14 @@ void tst_Domain::populatedTemplateSurvivesRoundTrip()
     QVERIFY(!decodedPoints[3]->standard());
 
     QCOMPARE(decoded->schematicImage()->imageData(), kImageBytes);
-    QCOMPARE(decoded->schematicImage()->name(), std::string("door"));
     QCOMPARE(decoded->standards()[1]->name(), kUtf8Text);
     QCOMPARE(decoded->tagValues()[0]->value(), kUtf8Text);
     QCOMPARE(decoded->tagValues()[0]->definitionId(), decoded->tagDefinitions()[0]->id());
     QCOMPARE(decoded->measurementConfiguration()->properties()[1]->value(), kUtf8Text);
-
-    const auto lab = std::dynamic_pointer_cast<LabValue>(
-        decoded->standards()[0]->appearanceValues(0)->colorValues()[0]);
+    const auto lab = std::dynamic_pointer_cast<LabValue>(decoded->standards()[0]->appearanceValues(0)->colorValues()[0]);
     QVERIFY(lab);
     QCOMPARE(lab->colorimetricCondition(), std::string("D50/2"));
-
-    const auto labTolerance = std::dynamic_pointer_cast<LabToleranceBase>(
-        decoded->privateToleranceSets()[1]->tolerances()[0]);
+    const auto labTolerance = std::dynamic_pointer_cast<LabToleranceBase>(decoded->privateToleranceSets()[1]->tolerances()[0]);
     QVERIFY(labTolerance);
     QVERIFY(*labTolerance->colorimetricCondition() == *makeCondition());
     QVERIFY(!std::dynamic_pointer_cast<LabToleranceBase>(decoded->sharedToleranceSets()[0]->tolerances()[1]));
@@ -340,15 +331,6 @@ void tst_Domain::everyClassSurvivesRoundTrip()
     QCOMPARE(ObjectCodec::serialize(*decoded), bytes);
 }
 
-void tst_Domain::checkPointsFlattenCouplesInMemberOrder()
-{
-    QCJobTemplate jobTemplate;
-    jobTemplate.setCheckListItems({makeCheckPoint("1"), makeCouple("A", makeCheckPoint("2a"), makeCheckPoint("2b")),
-                                   makeCheckPoint("3"), makeCouple("B", makeCheckPoint("4a"), makeCheckPoint("4b"))});
-
-    QCOMPARE(names(jobTemplate.checkPoints()), QStringList({"1", "2a", "2b", "3", "4a", "4b"}));
-}
-
 void tst_Domain::checkZoneIndex_data()
 {
     QTest::addColumn<QString>("name");
@@ -372,6 +354,7 @@ void tst_Domain::checkZoneIndex()
     QCJobTemplate jobTemplate;
     jobTemplate.setCheckListItems(
         {makeCheckPoint("single"), makeCouple("A", first, second), makeCheckPoint("last")});
+    QCOMPARE(names(jobTemplate.checkPoints()), QStringList({"single", "first", "second", "last"}));
 
     std::shared_ptr<CheckPoint> wanted;
     for (const auto& checkPoint : jobTemplate.checkPoints()) {
@@ -385,76 +368,12 @@ void tst_Domain::checkZoneIndex()
     QCOMPARE(int(jobTemplate.checkZoneIndex(wanted)), index);
 }
 
-void tst_Domain::appearanceValuesByIndex_data()
+void tst_Domain::appearanceValuesPastTheEndAreNull()
 {
-    QTest::addColumn<int>("index");
-    QTest::addColumn<bool>("found");
-
-    QTest::newRow("first") << 0 << true;
-    QTest::newRow("last") << 1 << true;
-    QTest::newRow("one past the end") << 2 << false;
-}
-
-void tst_Domain::appearanceValuesByIndex()
-{
-    QFETCH(int, index);
-    QFETCH(bool, found);
-
     const auto standard = makeStandard("RAL 9010");
-    const auto result = standard->appearanceValues(std::size_t(index));
-    QCOMPARE(bool(result), found);
-    if (found)
-        QCOMPARE(result, standard->appearanceValuesList()[std::size_t(index)]);
+    QCOMPARE(standard->appearanceValues(1), standard->appearanceValuesList()[1]);
+    QVERIFY(!standard->appearanceValues(2));
 }
-
-namespace {
-
-// The two libraries behind one interface, so one test covers both.
-struct LibraryCase
-{
-    std::shared_ptr<NamedObject> library;
-    std::vector<std::shared_ptr<NamedObject>> members;
-    std::function<std::vector<std::shared_ptr<NamedObject>>(const BaseObject&)> membersOf;
-    QString idsField;
-};
-
-LibraryCase makeLibraryCase(const QString& kind)
-{
-    LibraryCase result;
-    if (kind == "standards") {
-        auto library = std::make_shared<ColorStandardsLibrary>();
-        std::vector<std::shared_ptr<Standard>> standards;
-        for (const char* name : {"RAL 1000", "RAL 1001", "RAL 1002"})
-            standards.push_back(makeStandard(name));
-        library->setStandards(standards);
-        result.library = library;
-        result.members.assign(standards.begin(), standards.end());
-        result.membersOf = [](const BaseObject& object) {
-            const auto members = dynamic_cast<const ColorStandardsLibrary&>(object).standards();
-            return std::vector<std::shared_ptr<NamedObject>>(members.begin(), members.end());
-        };
-        result.idsField = "standardIds";
-    } else {
-        auto library = std::make_shared<PropertyLibrary>();
-        std::vector<std::shared_ptr<TagDefinition>> definitions;
-        for (const char* name : {"Part", "Supplier", "Größe"}) {
-            definitions.push_back(makeTagDefinition());
-            definitions.back()->setName(name);
-        }
-        library->setProperties(definitions);
-        result.library = library;
-        result.members.assign(definitions.begin(), definitions.end());
-        result.membersOf = [](const BaseObject& object) {
-            const auto members = dynamic_cast<const PropertyLibrary&>(object).properties();
-            return std::vector<std::shared_ptr<NamedObject>>(members.begin(), members.end());
-        };
-        result.idsField = "propertyIds";
-    }
-    result.library->setName("Library");
-    return result;
-}
-
-} // namespace
 
 void tst_Domain::librariesStoreMemberIdsOnly_data()
 {
@@ -466,7 +385,7 @@ void tst_Domain::librariesStoreMemberIdsOnly_data()
 void tst_Domain::librariesStoreMemberIdsOnly()
 {
     QFETCH(QString, kind);
-    const LibraryCase libraryCase = makeLibraryCase(kind);
+    const TestLibrary libraryCase = TestLibrary::make(kind);
     const auto& members = libraryCase.members;
 
     std::vector<std::string> ids;
@@ -484,7 +403,7 @@ void tst_Domain::librariesStoreMemberIdsOnly()
 
     const auto decoded = ObjectCodec::deserialize(bytes);
     QCOMPARE(decoded->referencedIds(), ids);
-    auto standIns = libraryCase.membersOf(*decoded);
+    auto standIns = TestLibrary::membersOf(*decoded);
     QCOMPARE(standIns.size(), members.size());
     for (const auto& standIn : standIns)
         QVERIFY(standIn->name().empty());
@@ -501,7 +420,7 @@ void tst_Domain::librariesStoreMemberIdsOnly()
         return {};
     });
     QCOMPARE(asked, ids);
-    const auto resolved = libraryCase.membersOf(*decoded);
+    const auto resolved = TestLibrary::membersOf(*decoded);
     QCOMPARE(resolved[0], members[0]);
     QCOMPARE(resolved[1], standIns[1]);
     QCOMPARE(resolved[2], standIns[2]);
@@ -593,7 +512,6 @@ void tst_Domain::cloneSharesImageBytes()
     auto jobTemplate = makeTemplate();
     const auto copy = ObjectCodec::clone(*jobTemplate);
     QVERIFY(copy && copy.get() != jobTemplate.get());
-    QCOMPARE(copy->id(), jobTemplate->id());
     QCOMPARE(copy->schematicImage()->sharedImageData(), jobTemplate->schematicImage()->sharedImageData());
     QCOMPARE(ObjectCodec::serialize(*copy), ObjectCodec::serialize(*jobTemplate));
 

@@ -3,7 +3,6 @@
 
 #include "host/widgets/DirEntryBrowserWidget.h"
 #include "host/widgets/DirEntryTreeModel.h"
-#include "plugin/PellamSettingsKeys.h"
 #include "plugin/PellamWidget.h"
 #include "host/domain/QCJobTemplate.h"
 #include "detail/QCJobTemplateDetailWidget.h"
@@ -56,8 +55,7 @@ private slots:
     void selectionDecidesPageAndTemplate();
     void newTemplateIsNamedAndBecomesModelsTemplate();
     void longTemplateNameKeepsTheWindowNarrow();
-    void editorModificationReachesBrowser();
-    void renameInBrowserRetitlesTheEditor();
+    void editsAndRenamesReachTheOtherSide();
 
 private:
     PellamWidget* createWidget();
@@ -112,12 +110,8 @@ void tst_PellamWidget::firstStartShowsPlaceholderWithDefaultSizes()
     m_host->show();
     QVERIFY(QTest::qWaitForWindowExposed(m_host.get()));
     const QList<int> sizes = m_widget->findChild<QSplitter*>()->sizes();
-    QCOMPARE(sizes.size(), 2);
-    // Qt raises the browser's 100 to its minimum width (room for twenty
-    // characters) and shares out the rest 1 : 6, so the split is not exactly
-    // 1 : 6. What the user must see: the editor has by far the larger share,
-    // and the browser is not squeezed to its minimum, as it is without
-    // default sizes.
+    // Qt raises the browser's share to its minimum width, so the split is not
+    // exactly 1 : 6; without default sizes the browser is squeezed to its minimum.
     const int browserMinimum = m_widget->findChild<DirEntryBrowserWidget*>()->minimumSizeHint().width();
     const QString actual = QStringLiteral("%1 %2 (browser minimum %3)").arg(sizes[0]).arg(sizes[1]).arg(browserMinimum);
     QVERIFY2(sizes[1] >= 2 * sizes[0], qPrintable(actual));
@@ -126,7 +120,6 @@ void tst_PellamWidget::firstStartShowsPlaceholderWithDefaultSizes()
     auto* placeholder = qobject_cast<QLabel*>(pages()->widget(0));
     QVERIFY(placeholder);
     QCOMPARE(placeholder->text(), QStringLiteral("Please create a new job template or open an existing one."));
-    QCOMPARE(placeholder->alignment(), Qt::AlignCenter);
 }
 
 void tst_PellamWidget::splitterLayoutSurvivesRestart()
@@ -134,8 +127,6 @@ void tst_PellamWidget::splitterLayoutSurvivesRestart()
     m_widget->findChild<QSplitter*>()->setSizes({300, 400});
     const QByteArray state = m_widget->findChild<QSplitter*>()->saveState();
     delete m_widget;
-    QCOMPARE(QSettings().value(PellamKeys::MainSplitterState).toByteArray(), state);
-
     m_widget = createWidget();
     QCOMPARE(m_widget->findChild<QSplitter*>()->saveState(), state);
 }
@@ -227,23 +218,17 @@ void tst_PellamWidget::selectionDecidesPageAndTemplate()
 void tst_PellamWidget::newTemplateIsNamedAndBecomesModelsTemplate()
 {
     auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
-    QVERIFY(browser);
     QTRY_VERIFY(browser->treeModel()->rowCount() == 0);
-    auto first = std::dynamic_pointer_cast<QCJobTemplate>(m_widget->newNamedObject());
-    QVERIFY(first);
-    QCOMPARE(first->name(), std::string("Job Template"));
-    QCOMPARE(m_widget->model()->jobTemplate(), first);
-    QVERIFY(first->schematicImage());
-    QVERIFY(first->schematicImage()->imageData().empty());
-    QCOMPARE(editorHeading()->title(), QStringLiteral("Checkpoints for: Job Template"));
+    browser->actionNew()->trigger();
 
-    browser->actionNew()->trigger();
     QTRY_COMPARE(browser->treeModel()->rowCount(), 1);
-    QCOMPARE(browser->treeModel()->root()->children().front()->displayName(), QStringLiteral("Job Template"));
-    QVERIFY(browser->treeModel()->root()->children().front()->isModified());
-    browser->actionNew()->trigger();
-    QCOMPARE(browser->treeModel()->rowCount(), 2);
-    QCOMPARE(browser->treeModel()->root()->children().back()->displayName(), QStringLiteral("Job Template 2"));
+    Node* node = browser->treeModel()->root()->children().front().get();
+    QCOMPARE(node->displayName(), QStringLiteral("Job Template"));
+    QVERIFY(node->isModified());
+    const auto created = m_widget->model()->jobTemplate();
+    QCOMPARE(created, node->object());
+    QVERIFY(created->schematicImage() && created->schematicImage()->imageData().empty());
+    QCOMPARE(editorHeading()->title(), QStringLiteral("Checkpoints for: Job Template"));
 }
 
 void tst_PellamWidget::longTemplateNameKeepsTheWindowNarrow()
@@ -289,29 +274,22 @@ Node* tst_PellamWidget::openStoredTemplate()
     return node;
 }
 
-void tst_PellamWidget::editorModificationReachesBrowser()
+// An edit in the editor marks the template in the browser; a rename in the
+// browser retitles the editor.
+void tst_PellamWidget::editsAndRenamesReachTheOtherSide()
 {
     Node* node = openStoredTemplate();
     QVERIFY(node);
     auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
     QVERIFY(!node->isModified());
+    QTRY_COMPARE(editorHeading()->title(), QStringLiteral("Checkpoints for: Door Panel"));
 
-    auto open = std::dynamic_pointer_cast<QCJobTemplate>(node->object());
-    emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(open);
+    emit m_widget->findChild<QCJobTemplateDetailWidget*>()->sgJobTemplateWasModified(
+        std::dynamic_pointer_cast<QCJobTemplate>(node->object()));
     QVERIFY(node->isModified());
     QVERIFY(browser->actionSave()->isEnabled());
-}
-
-void tst_PellamWidget::renameInBrowserRetitlesTheEditor()
-{
-    Node* node = openStoredTemplate();
-    QVERIFY(node);
-    auto* browser = m_widget->findChild<DirEntryBrowserWidget*>();
-    auto* group = m_widget->findChild<QGroupBox*>(QStringLiteral("checkZoneGroupBox"));
-    QTRY_COMPARE(group->title(), QStringLiteral("Checkpoints for: Door Panel"));
-
     browser->treeModel()->renameNode(node, "Door Trim", {});
-    QTRY_COMPARE(group->title(), QStringLiteral("Checkpoints for: Door Trim"));
+    QTRY_COMPARE(editorHeading()->title(), QStringLiteral("Checkpoints for: Door Trim"));
 }
 
 QC_TEST_MAIN(tst_PellamWidget)
