@@ -11,3 +11,7 @@ if [ ! -f "$build/CMakeCache.txt" ] && [ -z "${CMAKE_GENERATOR:-}" ]; then
 fi
 cmake -S "$root" -B "$build" "${generator[@]}" -DCMAKE_BUILD_TYPE=RelWithDebInfo "$@"
 cmake --build "$build" -j2
+# A form (.ui) edited since the last build has its header regenerated during
+# the build, after the sources that include it may already have been
+# compiled; the second pass compiles those again and is a no-op otherwise.
+cmake --build "$build" -j2
