@@ -285,6 +285,11 @@ void CheckZoneEditor::rebuild()
     m_usedLetters.clear();
     m_currentRow = nullptr;
     m_selectedItem = nullptr;
+    // A shown list lays out every row and places every row widget again for
+    // each row added; hidden, it does so once when it is shown again.
+    QListWidget* list = m_ui->checkZoneListWidget;
+    const bool wasHidden = list->isHidden();
+    list->hide();
     clearRows();
     emit sgRefreshCheckPointLayer();
 
@@ -297,6 +302,8 @@ void CheckZoneEditor::rebuild()
             addCheckPointRow(checkPoint, QString(), 0, cpIndex++);
         }
     }
+
+    list->setHidden(wasHidden);
 
     if (m_currentRow)
         m_ui->coupleCheckPointsButton->setEnabled(false);
