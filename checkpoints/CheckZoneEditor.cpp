@@ -304,6 +304,9 @@ void CheckZoneEditor::rebuild()
     }
 
     list->setHidden(wasHidden);
+    // Adding rows left the last one selected; no row is chosen until the user
+    // clicks one, and a stray selection would be coupled with the next click.
+    list->clearSelection();
 
     if (m_currentRow)
         m_ui->coupleCheckPointsButton->setEnabled(false);

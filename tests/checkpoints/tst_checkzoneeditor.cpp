@@ -552,6 +552,7 @@ void tst_CheckZoneEditor::rebuildLeavesNothingOfThePreviousTemplate()
 
     QCOMPARE(rowsText(), "1:Q0, 2:Q1");
     QCOMPARE(m_editor->findChildren<CheckPointCouplet*>().size(), 2);
+    QVERIFY(list()->selectedItems().isEmpty());
     for (const char* name : {"deleteCheckZoneButton", "coupleCheckPointsButton", "deCoupleCheckPointsButton",
                              "swapCoupledCheckPoints", "checkZonePropertiesButton", "addImageButton"})
         QVERIFY2(!button(name)->isEnabled(), name);
