@@ -129,10 +129,9 @@ private slots:
     void deleteActsOnTheClickedRowNotTheKeyboardRow();
     void swapReselectsTheCoupleRow();
     void rebuildLeavesNothingOfThePreviousTemplate();
-    void withoutMeasurementConfigurationAddingIsOff();
 
 private:
-    void open(std::vector<std::shared_ptr<CheckListItem>> items, bool withConfiguration = true);
+    void open(std::vector<std::shared_ptr<CheckListItem>> items);
     QListWidget* list() const;
     QPushButton* button(const char* name) const;
     CheckPointCouplet* couplet(int row) const;
@@ -167,12 +166,11 @@ void tst_CheckZoneEditor::cleanup()
     m_store.reset();
 }
 
-void tst_CheckZoneEditor::open(std::vector<std::shared_ptr<CheckListItem>> items, bool withConfiguration)
+void tst_CheckZoneEditor::open(std::vector<std::shared_ptr<CheckListItem>> items)
 {
     m_template = std::make_shared<QCJobTemplate>();
     m_template->setCheckListItems(items);
-    if (withConfiguration)
-        m_template->setMeasurementConfiguration(std::make_shared<MeasurementConfiguration>());
+    m_template->setMeasurementConfiguration(std::make_shared<MeasurementConfiguration>());
     m_model->setJobTemplate(m_template);
     m_model->notifyMeasurementConfigLoaded();
 }
@@ -558,14 +556,6 @@ void tst_CheckZoneEditor::rebuildLeavesNothingOfThePreviousTemplate()
         QVERIFY2(!button(name)->isEnabled(), name);
     coupleByClicks(0, 1);
     QCOMPARE(checkListText(*m_template), "A[Q0<CP1> Q1<CP2>]");
-}
-
-void tst_CheckZoneEditor::withoutMeasurementConfigurationAddingIsOff()
-{
-    open({couple("A", checkPoint("P0"), checkPoint("P1"))}, false);
-
-    QVERIFY(!button("addCheckZoneButton")->isEnabled());
-    QCOMPARE(rowsText(), "A1:P0 2:P1");
 }
 
 QC_TEST_MAIN(tst_CheckZoneEditor)
