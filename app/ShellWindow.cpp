@@ -58,14 +58,14 @@ QWidget* ShellWindow::menuRow()
     auto* layout = new QHBoxLayout(row);
     layout->setContentsMargins(0, 0, 0, 0);
     layout->setSpacing(0);
-    layout->addWidget(m_topBars, 1);
+    layout->addWidget(m_topBars);
     auto* shellMenus = new QMenuBar(row);
     shellMenus->setObjectName(QStringLiteral("shellMenuBar"));
     QMenu* tools = shellMenus->addMenu(tr("&Tools"));
     m_importAction = tools->addAction(tr("&Import Standards…"), this, &ShellWindow::importStandards);
     m_importAction->setObjectName(QStringLiteral("importStandardsAction"));
     m_importAction->setStatusTip(tr("Import a colour standards library from a CGATS file"));
-    layout->addWidget(shellMenus);
+    layout->addWidget(shellMenus, 1);
     return row;
 }
 
