@@ -1,5 +1,6 @@
 #include "app/ShellOptions.h"
 
+#include "app/standardsimport/StandardsImport.h"
 #include "host/store/MarloModel.h"
 
 #include <QCommandLineParser>
@@ -25,7 +26,20 @@ ShellOptions ShellOptions::parse(const QStringList& arguments)
     const QCommandLineOption screenshot(QStringLiteral("screenshot"),
                                         QStringLiteral("Save a picture of the window to <png> and quit."),
                                         QStringLiteral("png"));
-    parser.addOptions({store, plugins, readOnly, noSamples, screenshot});
+    const QCommandLineOption importStandards(
+        QStringLiteral("import-standards"),
+        QStringLiteral("Import the colour standards of the CGATS file <file> into the store as a library, then quit"
+                       " (exit code 0 on success, 2 on failure)."),
+        QStringLiteral("file"));
+    const QCommandLineOption folder(QStringLiteral("folder"),
+                                    QStringLiteral("With --import-standards: file the library in <name> (default:"
+                                                   " Imported)."),
+                                    QStringLiteral("name"), QString::fromLatin1(StandardsImport::kDefaultFolder));
+    const QCommandLineOption condition(QStringLiteral("condition"),
+                                       QStringLiteral("With --import-standards: the illuminant/observer for a file"
+                                                      " that names none (default: D65/10)."),
+                                       QStringLiteral("condition"));
+    parser.addOptions({store, plugins, readOnly, noSamples, screenshot, importStandards, folder, condition});
 
     ShellOptions options;
     if (!parser.parse(arguments)) {
@@ -42,6 +56,11 @@ ShellOptions ShellOptions::parse(const QStringList& arguments)
     options.readOnly = parser.isSet(readOnly);
     options.withSamples = !parser.isSet(noSamples) && !options.readOnly;
     options.screenshotPath = parser.value(screenshot);
+    options.importPath = parser.value(importStandards);
+    options.importFolder = parser.value(folder);
+    options.importCondition = parser.value(condition);
+    if (options.importPath.isEmpty() && (parser.isSet(folder) || parser.isSet(condition)))
+        options.error = QStringLiteral("--folder and --condition go with --import-standards.");
     return options;
 }
 

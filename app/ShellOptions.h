@@ -17,6 +17,9 @@ struct ShellOptions
     bool readOnly = false;
     bool withSamples = true;
     QString screenshotPath; // when set: save a picture of the window and quit
+    QString importPath;     // when set: import these standards and quit, showing no window
+    QString importFolder;   // the folder the import files into
+    QString importCondition; // used when the imported file names no condition; empty: the default
     QString error;          // why the command line was refused
 
     static ShellOptions parse(const QStringList& arguments);

@@ -1,26 +1,47 @@
 #include "app/ShellWindow.h"
 
+#include "app/standardsimport/StandardsImport.h"
+#include "app/standardsimport/StandardsImportRunner.h"
 #include "host/client/AppWidget.h"
 #include "host/client/ClientInterface.h"
 #include "host/client/CorvoTopBar.h"
+#include "host/store/MarloModel.h"
 #include "host/widgets/ImageRepository.h"
 
 #include <QCloseEvent>
 #include <QFile>
+#include <QFileDialog>
+#include <QFileInfo>
+#include <QHBoxLayout>
+#include <QMenu>
+#include <QMenuBar>
+#include <QMessageBox>
+#include <QSettings>
 #include <QShortcut>
 #include <QStackedWidget>
+#include <QStatusBar>
 #include <QTabWidget>
 #include <QToolBar>
 
 namespace vemi {
 
+namespace {
+
+// Where the last imported file was, so that the next import starts there.
+const char* const kImportFolderKey = "shell/lastImportFolder";
+
+} // namespace
+
 ShellWindow::ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Client>& clients, QWidget* parent)
-    : QMainWindow(parent), m_tabs(new QTabWidget(this)), m_topBars(new QStackedWidget(this))
+    : QMainWindow(parent), m_tabs(new QTabWidget(this)), m_topBars(new QStackedWidget(this)),
+      m_importRunner(new StandardsImportRunner(store, this))
 {
     setWindowTitle(tr("QC Host"));
     m_tabs->setDocumentMode(true);
     setCentralWidget(m_tabs);
-    setMenuWidget(m_topBars);
+    setMenuWidget(menuRow());
+    m_importAction->setEnabled(store.isWritable());
+    connect(m_importRunner, &StandardsImportRunner::finished, this, &ShellWindow::onImportFinished);
     for (const PluginCatalog::Client& client : clients)
         addClient(store, client.client);
     connect(m_tabs, &QTabWidget::currentChanged, this, &ShellWindow::onCurrentTabChanged);
@@ -28,6 +49,47 @@ ShellWindow::ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Cli
     auto* menuKey = new QShortcut(QKeySequence(Qt::Key_F10), this);
     connect(menuKey, &QShortcut::activated, this, &ShellWindow::openFirstMenu);
     onCurrentTabChanged(m_tabs->currentIndex());
+}
+
+// The client's top bar, then the shell's own menus.
+QWidget* ShellWindow::menuRow()
+{
+    auto* row = new QWidget(this);
+    auto* layout = new QHBoxLayout(row);
+    layout->setContentsMargins(0, 0, 0, 0);
+    layout->setSpacing(0);
+    layout->addWidget(m_topBars);
+    auto* shellMenus = new QMenuBar(row);
+    shellMenus->setObjectName(QStringLiteral("shellMenuBar"));
+    QMenu* tools = shellMenus->addMenu(tr("&Tools"));
+    m_importAction = tools->addAction(tr("&Import Standards…"), this, &ShellWindow::importStandards);
+    m_importAction->setObjectName(QStringLiteral("importStandardsAction"));
+    m_importAction->setStatusTip(tr("Import a colour standards library from a CGATS file"));
+    layout->addWidget(shellMenus, 1);
+    return row;
+}
+
+void ShellWindow::importStandards()
+{
+    QSettings settings;
+    const QString path = QFileDialog::getOpenFileName(
+        this, tr("Import Standards"), settings.value(kImportFolderKey).toString(),
+        tr("CGATS files (*.txt *.cgats *.it8);;All files (*)"));
+    if (path.isEmpty())
+        return;
+    settings.setValue(kImportFolderKey, QFileInfo(path).absolutePath());
+    if (m_importRunner->start(path, QString::fromLatin1(StandardsImport::kDefaultFolder)))
+        m_importAction->setEnabled(false);
+}
+
+void ShellWindow::onImportFinished(bool imported, const QString& message)
+{
+    m_importAction->setEnabled(true);
+    statusBar()->showMessage(message, 10000);
+    if (imported)
+        QMessageBox::information(this, tr("Import Standards"), message);
+    else
+        QMessageBox::warning(this, tr("Import Standards"), message);
 }
 
 void ShellWindow::addClient(MarloModel& store, ClientInterface* client)

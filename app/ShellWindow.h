@@ -6,6 +6,7 @@
 
 #include <vector>
 
+class QAction;
 class QStackedWidget;
 class QTabWidget;
 class QToolBar;
@@ -15,6 +16,7 @@ namespace vemi {
 class AppWidget;
 class CorvoTopBar;
 class MarloModel;
+class StandardsImportRunner;
 
 // The host's main window: one tab per client, with the client's top bar and
 // tool bar shown while its tab is current.
@@ -29,6 +31,9 @@ public:
     AppWidget* appWidget(int tab) const;
     CorvoTopBar* topBar(int tab) const;
     QToolBar* toolBar(int tab) const;
+    // "Tools" → "Import Standards…", the shell's own menu beside the client's.
+    QAction* importStandardsAction() const { return m_importAction; }
+    StandardsImportRunner* importRunner() const { return m_importRunner; }
 
 protected:
     void closeEvent(QCloseEvent* event) override;
@@ -38,6 +43,9 @@ private:
     void onCurrentTabChanged(int tab);
     // Opens the first menu of the current tab's top bar, as F10 does in a menu bar.
     void openFirstMenu();
+    QWidget* menuRow();
+    void importStandards();
+    void onImportFinished(bool imported, const QString& message);
     static QString styleSheet(const QString& name);
 
     QTabWidget* m_tabs;
@@ -45,6 +53,8 @@ private:
     std::vector<AppWidget*> m_appWidgets;
     std::vector<QToolBar*> m_toolBars;
     int m_currentTab = -1;
+    QAction* m_importAction = nullptr;
+    StandardsImportRunner* m_importRunner;
 };
 
 } // namespace vemi

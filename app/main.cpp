@@ -3,6 +3,7 @@
 #include "app/PluginCatalog.h"
 #include "app/sampledata/SampleData.h"
 #include "app/ShellOptions.h"
+#include "app/standardsimport/CommandLineImport.h"
 #include "host/client/SettingsManager.h"
 #include "app/ShellWindow.h"
 
@@ -40,6 +41,9 @@ int main(int argc, char* argv[])
         complain(storeError);
         return 2;
     }
+    if (!options.importPath.isEmpty())
+        return vemi::CommandLineImport::run(store, options.importPath, options.importFolder, options.importCondition,
+                                            stdout, stderr);
     QStringList refusedIds;
     const auto otherStores = options.otherStoreFiles(
         vemi::SettingsManager::instance().getGeneralSettings()->dispatcherList(), &refusedIds);

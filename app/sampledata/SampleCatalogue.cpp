@@ -1,6 +1,6 @@
 #include "app/sampledata/SampleCatalogue.h"
 
-#include "app/sampledata/LabToScreen.h"
+#include "colour/LabToScreen.h"
 #include "app/sampledata/SampleChart.h"
 #include "app/sampledata/SampleDrawings.h"
 #include "host/domain/AppearanceValues.h"

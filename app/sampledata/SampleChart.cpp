@@ -1,6 +1,6 @@
 #include "app/sampledata/SampleChart.h"
 
-#include "app/sampledata/LabToScreen.h"
+#include "colour/LabToScreen.h"
 #include "host/domain/AppearanceValues.h"
 #include "host/domain/LabValue.h"
 #include "host/domain/RGBValue.h"

@@ -1,6 +1,6 @@
 #include "app/sampledata/SampleData.h"
 
-#include "app/sampledata/LabToScreen.h"
+#include "colour/LabToScreen.h"
 #include "app/sampledata/SampleCatalogue.h"
 #include "host/domain/ColorimetricCondition.h"
 #include "host/domain/ColorStandardsLibrary.h"

@@ -238,18 +238,31 @@ void StoreDatabase::applyPragmas()
 
 QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings)
 {
+    QSqlQuery query = prepare(sql);
+    execute(query, bindings);
+    return query;
+}
+
+QSqlQuery StoreDatabase::prepare(const QString& sql)
+{
     QSqlQuery query(QSqlDatabase::database(m_connectionName, false));
     query.setForwardOnly(true);
-    const auto fail = [this](const QSqlError& error) {
-        return StoreError(describe(error).toStdString(), error.nativeErrorCode().toInt());
-    };
     if (!query.prepare(sql))
-        throw fail(query.lastError());
-    for (const QVariant& value : bindings)
-        query.addBindValue(value);
-    if (!query.exec())
-        throw fail(query.lastError());
+        throw failure(query.lastError());
     return query;
+}
+
+void StoreDatabase::execute(QSqlQuery& query, const QVariantList& bindings)
+{
+    for (int i = 0; i < bindings.size(); ++i)
+        query.bindValue(i, bindings[i]);
+    if (!query.exec())
+        throw failure(query.lastError());
+}
+
+StoreError StoreDatabase::failure(const QSqlError& error) const
+{
+    return StoreError(describe(error).toStdString(), error.nativeErrorCode().toInt());
 }
 
 QVariant StoreDatabase::scalar(const QString& sql, const QVariantList& bindings)

@@ -1,5 +1,6 @@
 #pragma once
 
+#include "host/store/StoreError.h"
 #include "host/store/StoreOptions.h"
 
 #include <QSqlQuery>
@@ -40,6 +41,10 @@ public:
     // row; throws StoreError with the cause and the file (the dispatcher adds
     // what the command was doing).
     QSqlQuery run(const QString& sql, const QVariantList& bindings = {});
+    // For one statement run many times, as in a batch write: prepare once,
+    // then execute with each row's bindings. Both throw StoreError.
+    QSqlQuery prepare(const QString& sql);
+    void execute(QSqlQuery& query, const QVariantList& bindings);
     // The first column of the first row, or an invalid QVariant when there is none.
     QVariant scalar(const QString& sql, const QVariantList& bindings = {});
     // Runs body inside BEGIN IMMEDIATE … COMMIT; rolls back and rethrows on failure.
@@ -57,6 +62,7 @@ private:
     void connect(Access access);
     void openReadOnly();
     bool diskFull() const;
+    StoreError failure(const QSqlError& error) const;
     void checkOwnership();
     void migrate();
     void applyPragmas();

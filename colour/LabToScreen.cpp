@@ -1,24 +1,30 @@
-#include "app/sampledata/LabToScreen.h"
+#include "colour/LabToScreen.h"
 
 #include "host/domain/ColorimetricCondition.h"
 
 #include <lcms2.h>
 
 #include <algorithm>
+#include <map>
+#include <string>
 
 namespace vemi {
 
 namespace {
 
-// Chromaticities of the illuminants' whites for the 2 degree observer.
+// Chromaticities of the illuminants' whites for the 2 degree observer
+// (CIE 15:2004), for every illuminant CieTables holds.
 bool whiteOf(const std::string& illuminant, cmsCIExyY* white)
 {
-    if (illuminant == "D50")
-        *white = {0.3457, 0.3585, 1.0};
-    else if (illuminant == "D65")
-        *white = {0.3127, 0.3290, 1.0};
-    else
+    static const std::map<std::string, cmsCIExyY> whites = {
+        {"A", {0.44757, 0.40745, 1.0}},   {"D50", {0.3457, 0.3585, 1.0}},   {"D55", {0.33242, 0.34743, 1.0}},
+        {"D65", {0.3127, 0.3290, 1.0}},   {"D75", {0.29902, 0.31485, 1.0}}, {"F2", {0.37208, 0.37529, 1.0}},
+        {"F11", {0.38052, 0.37713, 1.0}},
+    };
+    const auto found = whites.find(illuminant);
+    if (found == whites.end())
         return false;
+    *white = found->second;
     return true;
 }
 

@@ -16,9 +16,10 @@ class ColorimetricCondition;
 class LabToScreen
 {
 public:
-    // For Lab values under the condition's illuminant, D50 or D65; the white is
-    // taken for the 2 degree observer, the one sRGB is defined for. Null for
-    // another illuminant or when Little CMS cannot build the transform.
+    // For Lab values under the condition's illuminant: A, D50, D55, D65, D75,
+    // F2 or F11. The white is taken for the 2 degree observer, the one sRGB is
+    // defined for. Null for another illuminant or when Little CMS cannot build
+    // the transform.
     static std::unique_ptr<LabToScreen> create(const ColorimetricCondition& condition);
 
     ~LabToScreen();
