@@ -267,6 +267,8 @@ void tst_Shell::keysReachTheBrowserAfterStartAndNew()
     RunningShell::press(Qt::Key_N, Qt::ControlModifier);
     QTRY_VERIFY(shell.find(QStringLiteral("Job Template")));
     QCOMPARE(QApplication::focusWidget(), static_cast<QWidget*>(shell.browser()->treeView()));
+    // The new entry becomes current once the store has answered; F2 acts on the current entry.
+    QTRY_VERIFY(shell.browser()->treeView()->currentIndex().data().toString().startsWith(QStringLiteral("Job Template")));
     typeInNextNameDialog(QStringLiteral("Bumper Left"));
     RunningShell::press(Qt::Key_F2);
     QTRY_VERIFY(shell.find(QStringLiteral("Bumper Left")));
