@@ -131,6 +131,9 @@ void CheckZoneEditor::on_addCheckZoneButton_clicked()
     if (cpIndex > 0) {
         const auto previous = m_model->checkPointAt(cpIndex - 1);
         checkPoint->setStandard(previous->standard());
+        // The choice comes with the standard: a new checkpoint is automatic by
+        // default, and the dialog would show (and keep) "Auto Select" instead.
+        checkPoint->setAutoStandard(previous->autoStandard());
         checkPoint->setTagDefinitions(previous->tagDefinitions());
         checkPoint->setTagValues(previous->tagValues());
         if (previous->skippable())

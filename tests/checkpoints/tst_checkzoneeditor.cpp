@@ -421,9 +421,13 @@ void tst_CheckZoneEditor::publishEmitsForEveryCheckpoint()
 void tst_CheckZoneEditor::addCopiesFromThePrecedingCheckpoint_data()
 {
     QTest::addColumn<bool>("coupleLast");
+    QTest::addColumn<bool>("templateHasStandard");
 
-    QTest::newRow("after a single checkpoint, with a couple before it") << false;
-    QTest::newRow("after the second member of a couple") << true;
+    QTest::newRow("after a single checkpoint, with a couple before it") << false << false;
+    QTest::newRow("after the second member of a couple") << true << false;
+    // The dialog then lists the standard: a copied choice must show as chosen,
+    // not as "Auto Select", or OK would drop it.
+    QTest::newRow("standard listed by the template") << false << true;
 }
 
 // Regression: settings were taken from the checkpoint numbered like the
@@ -431,6 +435,7 @@ void tst_CheckZoneEditor::addCopiesFromThePrecedingCheckpoint_data()
 void tst_CheckZoneEditor::addCopiesFromThePrecedingCheckpoint()
 {
     QFETCH(bool, coupleLast);
+    QFETCH(bool, templateHasStandard);
     auto lender = checkPoint("Lender");
     auto standard = std::make_shared<Standard>();
     standard->setName("Red");
@@ -445,6 +450,8 @@ void tst_CheckZoneEditor::addCopiesFromThePrecedingCheckpoint()
         open({checkPoint("P0"), couple("A", other, lender)});
     else
         open({couple("A", checkPoint("P0"), other), lender});
+    if (templateHasStandard)
+        m_template->setStandards({standard});
 
     answerPropertiesDialog(true, "Door", true);
     QTest::mouseClick(button("addCheckZoneButton"), Qt::LeftButton);
