@@ -776,6 +776,10 @@ void QCJobTemplateDetailWidget::onGrabRubberBandedImageArea(int cpIndex)
 
 void QCJobTemplateDetailWidget::addCheckPointToSchematic(int cpIndex, int coupletId, QRect rect)
 {
+    // A checkpoint whose area was never taken has size 0 × 0; a circle in the
+    // picture's corner would point the operator at the wrong place.
+    if (rect.isEmpty())
+        return;
     const Qt::GlobalColor circle = circleColour(coupletId);
     const QColor number = numberColour(circle);
     QGraphicsItem* layer = m_overlayLayer.get();

@@ -574,6 +574,8 @@ void tst_SchematicPane::overlayIsReplacedNotPiledUp()
         emit m_editor->sgRefreshCheckPointLayer();
         emit m_editor->sgAddCheckpointToSchematic(0, 0, QRect(10, 10, 20, 20));
         emit m_editor->sgAddCheckpointToSchematic(1, 1, QRect(60, 10, 20, 20));
+        // A checkpoint without an area has no place on the picture.
+        emit m_editor->sgAddCheckpointToSchematic(2, 1, QRect(0, 0, 0, 0));
     }
     QCOMPARE(itemsOfType(QGraphicsEllipseItem::Type).size(), 2);
 
