@@ -14,6 +14,8 @@
 #include "host/store/MarloModel.h"
 #include "model/QCJobTemplateModel.h"
 
+#include "bench/RecordingReporter.h"
+
 #include <benchmark/benchmark.h>
 
 #include <QApplication>
@@ -102,35 +104,6 @@ void rebuild(benchmark::State& state, Fixture* fixture, std::string name)
     }
 }
 
-class RecordingReporter : public benchmark::ConsoleReporter
-{
-public:
-    void ReportRuns(const std::vector<Run>& runs) override
-    {
-        ConsoleReporter::ReportRuns(runs);
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred)
-                continue;
-            Totals& totals = m_totals[run.run_name.function_name];
-            totals.sum += run.GetAdjustedRealTime();
-            ++totals.count;
-        }
-    }
-
-    double meanRealTime(const std::string& name) const
-    {
-        const auto found = m_totals.find(name);
-        return found == m_totals.end() ? -1.0 : found->second.sum / found->second.count;
-    }
-
-private:
-    struct Totals
-    {
-        double sum = 0.0;
-        int count = 0;
-    };
-    std::map<std::string, Totals> m_totals;
-};
 
 } // namespace
 

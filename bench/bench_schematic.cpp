@@ -19,6 +19,8 @@
 #include "host/store/MarloModel.h"
 #include "model/QCJobTemplateModel.h"
 
+#include "bench/RecordingReporter.h"
+
 #include <benchmark/benchmark.h>
 
 #include <QAbstractButton>
@@ -93,43 +95,6 @@ bool writeFile(const QString& path, const QByteArray& bytes)
 }
 
 // Keeps the mean real time of each benchmark, so that ratios can be printed.
-class RecordingReporter : public benchmark::ConsoleReporter
-{
-public:
-    void ReportRuns(const std::vector<Run>& runs) override
-    {
-        ConsoleReporter::ReportRuns(runs);
-        for (const Run& run : runs) {
-            if (run.run_type != Run::RT_Iteration || run.error_occurred)
-                continue;
-            Totals& totals = m_totals[run.run_name.function_name];
-            totals.sum += run.GetAdjustedRealTime();
-            totals.cpuSum += run.GetAdjustedCPUTime();
-            ++totals.count;
-        }
-    }
-
-    double meanRealTime(const std::string& name) const
-    {
-        const auto found = m_totals.find(name);
-        return found == m_totals.end() ? -1.0 : found->second.sum / found->second.count;
-    }
-
-    double meanCpuTime(const std::string& name) const
-    {
-        const auto found = m_totals.find(name);
-        return found == m_totals.end() ? -1.0 : found->second.cpuSum / found->second.count;
-    }
-
-private:
-    struct Totals
-    {
-        double sum = 0.0;
-        double cpuSum = 0.0;
-        int count = 0;
-    };
-    std::map<std::string, Totals> m_totals;
-};
 
 // The editor as the browser holds it: a real store, a model, the widget.
 struct Editor
