@@ -1,6 +1,7 @@
 #include "tests/common/ModalAnswer.h"
 #include "tests/common/ObjectBrowserAnswer.h"
 #include "tests/common/TempStore.h"
+#include "tests/common/PropertyFixtures.h"
 #include "tests/common/TestMain.h"
 
 #include "checkpoints/CheckZonePropertiesDialog.h"
@@ -30,53 +31,9 @@
 
 using namespace vemi;
 using ObjectBrowserAnswer::pickInNextDialog;
+using namespace PropertyFixtures;
 
 namespace {
-
-template <class T>
-std::shared_ptr<T> named(const std::string& name)
-{
-    auto object = std::make_shared<T>();
-    object->setName(name);
-    return object;
-}
-
-std::shared_ptr<TagDefinition> definition(const std::string& name, const std::string& defaultValue = {})
-{
-    auto d = named<TagDefinition>(name);
-    d->setDefaultValue(defaultValue);
-    return d;
-}
-
-std::shared_ptr<Response> answer(std::shared_ptr<BaseObject> object)
-{
-    return std::make_shared<GetMarloObjectResponse>(std::move(object));
-}
-
-QStringList names(const std::vector<std::shared_ptr<TagDefinition>>& definitions)
-{
-    QStringList result;
-    for (const auto& d : definitions)
-        result << QString::fromStdString(d->name());
-    return result;
-}
-
-// A value is written as "<definition name>=<value>"; a value whose
-// definition is not in the list shows as "?=<value>".
-QStringList valueTexts(const std::vector<std::shared_ptr<TagDefinition>>& definitions,
-                       const std::vector<std::shared_ptr<TagValue>>& values)
-{
-    QStringList result;
-    for (const auto& v : values) {
-        QString text = "?=" + QString::fromStdString(v->value());
-        for (const auto& d : definitions) {
-            if (d->id() == v->definitionId())
-                text = QString::fromStdString(d->name() + "=" + v->value());
-        }
-        result << text;
-    }
-    return result;
-}
 
 QStringList comboTexts(const QComboBox* combo)
 {

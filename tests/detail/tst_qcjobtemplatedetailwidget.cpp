@@ -2,6 +2,7 @@
 #include "tests/common/ObjectBrowserAnswer.h"
 #include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
+#include "tests/common/PropertyFixtures.h"
 #include "tests/common/TestMain.h"
 
 #include "detail/QCJobTemplateDetailWidget.h"
@@ -49,19 +50,12 @@
 Q_DECLARE_METATYPE(std::shared_ptr<vemi::QCJobTemplate>)
 
 using namespace vemi;
+using namespace PropertyFixtures;
 using ObjectBrowserAnswer::pickInNextDialog;
 
 namespace {
 
 const char* const kSecondStore = "Plant 2";
-
-template <class T>
-std::shared_ptr<T> named(const std::string& name)
-{
-    auto object = std::make_shared<T>();
-    object->setName(name);
-    return object;
-}
 
 std::shared_ptr<Standard> standardUnder(const std::string& name, const std::string& condition)
 {
@@ -81,40 +75,6 @@ std::shared_ptr<ToleranceSet> labToleranceSet(const std::string& name, const std
     auto set = named<ToleranceSet>(name);
     set->setTolerances({tolerance});
     return set;
-}
-
-std::shared_ptr<TagDefinition> definition(const std::string& name, const std::string& defaultValue = {})
-{
-    auto d = named<TagDefinition>(name);
-    d->setDefaultValue(defaultValue);
-    return d;
-}
-
-std::shared_ptr<Response> answer(std::shared_ptr<BaseObject> object)
-{
-    return std::make_shared<GetMarloObjectResponse>(std::move(object));
-}
-
-QStringList names(const std::vector<std::shared_ptr<TagDefinition>>& definitions)
-{
-    QStringList result;
-    for (const auto& d : definitions)
-        result << QString::fromStdString(d->name());
-    return result;
-}
-
-// A value is written as "<definition name>=<value>".
-QStringList valueTexts(const std::vector<std::shared_ptr<TagDefinition>>& definitions,
-                       const std::vector<std::shared_ptr<TagValue>>& values)
-{
-    QStringList result;
-    for (const auto& v : values) {
-        for (const auto& d : definitions) {
-            if (d->id() == v->definitionId())
-                result << QString::fromStdString(d->name() + "=" + v->value());
-        }
-    }
-    return result;
 }
 
 QStringList listTexts(const QListWidget* list)
