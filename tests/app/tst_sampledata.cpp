@@ -54,19 +54,6 @@ std::shared_ptr<DirectoryTreeResponse> tree(TempStore& store, const std::string&
     return std::dynamic_pointer_cast<DirectoryTreeResponse>(store.run(std::make_shared<GetDirectoryTree>(type)).response);
 }
 
-template <class T>
-std::vector<std::shared_ptr<T>> fetchAll(TempStore& store, int depth = 1)
-{
-    auto command = std::make_shared<GetMarloObjects>();
-    command->setType(T::typeId());
-    command->setDepth(depth);
-    std::vector<std::shared_ptr<T>> objects;
-    if (auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(command).response)) {
-        for (const auto& object : response->objects())
-            objects.push_back(std::dynamic_pointer_cast<T>(object));
-    }
-    return objects;
-}
 
 // Rows of the store's tables, read behind the store's back: also objects that no entry files.
 struct Rows
@@ -95,7 +82,7 @@ QString describe(const Rows& rows)
 template <class T>
 std::shared_ptr<T> fetchNamed(TempStore& store, const QString& name, int depth = 1)
 {
-    for (const auto& object : fetchAll<T>(store, depth)) {
+    for (const auto& object : store.fetchAll<T>(depth)) {
         if (object && object->name() == name.toStdString())
             return object;
     }
@@ -225,7 +212,7 @@ void tst_SampleData::templatesAreComplete()
     QFETCH(QString, name);
 
     std::shared_ptr<QCJobTemplate> jobTemplate;
-    for (const auto& candidate : fetchAll<QCJobTemplate>(*m_seeded)) {
+    for (const auto& candidate : m_seeded->fetchAll<QCJobTemplate>()) {
         if (candidate && candidate->name() == name.toStdString())
             jobTemplate = candidate;
     }
@@ -246,7 +233,7 @@ void tst_SampleData::templatesAreComplete()
 
     // The template's standards are copies of stored standards, not new objects.
     std::set<std::string> storedStandardIds;
-    for (const auto& standard : fetchAll<Standard>(*m_seeded))
+    for (const auto& standard : m_seeded->fetchAll<Standard>())
         storedStandardIds.insert(standard->id());
     std::map<std::string, std::shared_ptr<Standard>> standards;
     for (const auto& standard : jobTemplate->standards()) {
@@ -299,7 +286,7 @@ void tst_SampleData::templatesAreComplete()
 // setting of it, in the instrument's order, with a value it offers.
 void tst_SampleData::configurationsFitTheirInstruments()
 {
-    const auto configurations = fetchAll<MeasurementConfiguration>(*m_seeded);
+    const auto configurations = m_seeded->fetchAll<MeasurementConfiguration>();
     std::set<std::string> storedIds;
     std::set<std::string> models;
     for (const auto& configuration : configurations) {
@@ -323,7 +310,7 @@ void tst_SampleData::configurationsFitTheirInstruments()
     }
     QCOMPARE(int(models.size()), 2);
     // Each template carries a copy of a stored configuration, under its id.
-    for (const auto& jobTemplate : fetchAll<QCJobTemplate>(*m_seeded))
+    for (const auto& jobTemplate : m_seeded->fetchAll<QCJobTemplate>())
         QVERIFY(storedIds.count(jobTemplate->measurementConfiguration()->id()));
 }
 

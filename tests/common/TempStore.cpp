@@ -4,6 +4,8 @@
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObject.h"
 #include "host/store/GetMarloObjectResponse.h"
+#include "host/store/GetMarloObjects.h"
+#include "host/store/GetMarloObjectsResponse.h"
 #include "host/store/UpdateObject.h"
 
 #include <cstdio>
@@ -60,4 +62,13 @@ std::shared_ptr<vemi::BaseObject> TempStore::fetch(const std::string& type, cons
         std::fprintf(stderr, "TempStore: %s\n", qPrintable(answer.error->message()));
     const auto response = std::dynamic_pointer_cast<vemi::GetMarloObjectResponse>(answer.response);
     return response ? response->object() : nullptr;
+}
+
+std::vector<std::shared_ptr<vemi::BaseObject>> TempStore::fetchAllOfType(const std::string& type, int depth)
+{
+    auto command = std::make_shared<vemi::GetMarloObjects>();
+    command->setType(type);
+    command->setDepth(depth);
+    const auto response = std::dynamic_pointer_cast<vemi::GetMarloObjectsResponse>(run(command).response);
+    return response ? response->objects() : std::vector<std::shared_ptr<vemi::BaseObject>>();
 }

@@ -7,6 +7,7 @@
 
 #include <memory>
 #include <string>
+#include <vector>
 
 namespace vemi {
 class BaseObject;
@@ -37,6 +38,16 @@ public:
     // Both return null (and print the error) when the store refuses.
     std::shared_ptr<vemi::Response> save(std::shared_ptr<vemi::BaseObject> object, const std::string* folderId = nullptr);
     std::shared_ptr<vemi::BaseObject> fetch(const std::string& type, const std::string& id, int depth = 1);
+    // Every stored object of the type; empty when the store refuses.
+    std::vector<std::shared_ptr<vemi::BaseObject>> fetchAllOfType(const std::string& type, int depth = 1);
+    template <class T>
+    std::vector<std::shared_ptr<T>> fetchAll(int depth = 1)
+    {
+        std::vector<std::shared_ptr<T>> objects;
+        for (const auto& object : fetchAllOfType(T::typeId(), depth))
+            objects.push_back(std::dynamic_pointer_cast<T>(object));
+        return objects;
+    }
 
 private:
     QTemporaryDir m_dir;

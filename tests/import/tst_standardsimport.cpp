@@ -50,19 +50,6 @@ QByteArray cgats(const QByteArray& keywords, const QByteArray& fields, const QLi
 const QByteArray kLabFields = "SAMPLE_ID SAMPLE_NAME LAB_L LAB_A LAB_B";
 const QByteArray kD65Keywords = "ILLUMINANT \"D65\"\nOBSERVER \"10\"\n";
 
-template <class T>
-std::vector<std::shared_ptr<T>> fetchAll(TempStore& store, int depth = 1)
-{
-    auto command = std::make_shared<GetMarloObjects>();
-    command->setType(T::typeId());
-    command->setDepth(depth);
-    std::vector<std::shared_ptr<T>> objects;
-    if (auto response = std::dynamic_pointer_cast<GetMarloObjectsResponse>(store.run(command).response)) {
-        for (const auto& object : response->objects())
-            objects.push_back(std::dynamic_pointer_cast<T>(object));
-    }
-    return objects;
-}
 
 std::shared_ptr<DirectoryTreeResponse> tree(TempStore& store, const std::string& type)
 {
@@ -204,7 +191,7 @@ void tst_StandardsImport::importsLibrary()
 
     TempStore store;
     QCOMPARE(importInto(store, file), QString());
-    const auto libraries = fetchAll<ColorStandardsLibrary>(store, 2);
+    const auto libraries = store.fetchAll<ColorStandardsLibrary>(2);
     QCOMPARE(libraries.size(), size_t(1));
     QCOMPARE(QString::fromStdString(libraries[0]->name()), library);
     const auto standards = libraries[0]->standards();
@@ -372,7 +359,7 @@ void tst_StandardsImport::commandLine()
     if (exitCode != 0)
         QVERIFY2(err.contains(QStringLiteral("\"colours.cgats\"")), qPrintable(err));
 
-    const auto standards = fetchAll<Standard>(store);
+    const auto standards = store.fetchAll<Standard>();
     if (condition.isEmpty()) {
         QCOMPARE(rowsIn(store, "objects"), 0);
         QCOMPARE(rowsIn(store, "folders"), 0);
@@ -432,7 +419,7 @@ void tst_StandardsImport::runnerAsksForMissingCondition()
         QCOMPARE(rowsIn(store, "objects"), 0);
         return;
     }
-    const auto standards = fetchAll<Standard>(store);
+    const auto standards = store.fetchAll<Standard>();
     QCOMPARE(standards.size(), size_t(1));
     QCOMPARE(QString::fromStdString(labOf(*standards[0])->colorimetricCondition()), condition);
 }
@@ -463,7 +450,7 @@ void tst_StandardsImport::shellMenuImportsChosenFile()
     QVERIFY2(report.contains(QStringLiteral("Imported 2 standards from \"deck.it8\"")), qPrintable(report));
     QCOMPARE(finished.size(), 1);
     QVERIFY(window.importStandardsAction()->isEnabled());
-    QCOMPARE(fetchAll<Standard>(store).size(), size_t(2));
+    QCOMPARE(store.fetchAll<Standard>().size(), size_t(2));
 }
 
 QC_TEST_MAIN(tst_StandardsImport)
