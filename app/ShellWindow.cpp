@@ -34,7 +34,10 @@ const char* const kImportFolderKey = "shell/lastImportFolder";
 
 ShellWindow::ShellWindow(MarloModel& store, const std::vector<PluginCatalog::Client>& clients, QWidget* parent)
     : QMainWindow(parent), m_tabs(new QTabWidget(this)), m_topBars(new QStackedWidget(this)),
-      m_importRunner(new StandardsImportRunner(store, this))
+      m_importRunner(new StandardsImportRunner(store, this)),
+      m_chooseImportFile([](QWidget* parent, const QString& folder, const QString& filter) {
+          return QFileDialog::getOpenFileName(parent, tr("Import Standards"), folder, filter);
+      })
 {
     setWindowTitle(tr("QC Host"));
     m_tabs->setDocumentMode(true);
@@ -72,9 +75,8 @@ QWidget* ShellWindow::menuRow()
 void ShellWindow::importStandards()
 {
     QSettings settings;
-    const QString path = QFileDialog::getOpenFileName(
-        this, tr("Import Standards"), settings.value(kImportFolderKey).toString(),
-        tr("CGATS files (*.txt *.cgats *.it8);;All files (*)"));
+    const QString path = m_chooseImportFile(this, settings.value(kImportFolderKey).toString(),
+                                            tr("CGATS files (*.txt *.cgats *.it8);;All files (*)"));
     if (path.isEmpty())
         return;
     settings.setValue(kImportFolderKey, QFileInfo(path).absolutePath());

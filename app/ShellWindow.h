@@ -4,6 +4,7 @@
 
 #include <QMainWindow>
 
+#include <functional>
 #include <vector>
 
 class QAction;
@@ -34,6 +35,10 @@ public:
     // "Tools" → "Import Standards…", the shell's own menu beside the client's.
     QAction* importStandardsAction() const { return m_importAction; }
     StandardsImportRunner* importRunner() const { return m_importRunner; }
+    // Asks for the file to import: (parent, start folder, name filter) -> path,
+    // empty when cancelled. The file dialog by default; tests give their own.
+    using FileChooser = std::function<QString(QWidget*, const QString&, const QString&)>;
+    void setImportFileChooser(FileChooser chooser) { m_chooseImportFile = std::move(chooser); }
 
 protected:
     void closeEvent(QCloseEvent* event) override;
@@ -55,6 +60,7 @@ private:
     int m_currentTab = -1;
     QAction* m_importAction = nullptr;
     StandardsImportRunner* m_importRunner;
+    FileChooser m_chooseImportFile;
 };
 
 } // namespace vemi

@@ -436,17 +436,17 @@ void tst_StandardsImport::shellMenuImportsChosenFile()
     QVERIFY(window.importStandardsAction());
     QCOMPARE(window.importStandardsAction()->text(), QStringLiteral("&Import Standards…"));
 
-    QString report;
-    ModalAnswer::actOnNextModal([&](QWidget* modal) {
-        auto* dialog = qobject_cast<QFileDialog*>(modal);
-        QVERIFY(dialog);
-        ModalAnswer::clickInNextMessageBox(QMessageBox::Ok, &report);
-        dialog->selectFile(path);
-        static_cast<QDialog*>(dialog)->accept();
+    QString filter;
+    window.setImportFileChooser([&](QWidget*, const QString&, const QString& nameFilter) {
+        filter = nameFilter;
+        return path;
     });
+    QString report;
+    ModalAnswer::clickInNextMessageBox(QMessageBox::Ok, &report);
     QSignalSpy finished(window.importRunner(), &StandardsImportRunner::finished);
     window.importStandardsAction()->trigger();
     QTRY_VERIFY_WITH_TIMEOUT(!report.isEmpty(), 20000);
+    QCOMPARE(filter, QStringLiteral("CGATS files (*.txt *.cgats *.it8);;All files (*)"));
     QVERIFY2(report.contains(QStringLiteral("Imported 2 standards from \"deck.it8\"")), qPrintable(report));
     QCOMPARE(finished.size(), 1);
     QVERIFY(window.importStandardsAction()->isEnabled());
