@@ -20,7 +20,6 @@
 #include "host/store/GetMarloObjectsResponse.h"
 
 #include <QAction>
-#include <QFileDialog>
 #include <QProcess>
 #include <QSignalSpy>
 #include <QTemporaryDir>
