@@ -38,6 +38,10 @@ const std::vector<QStringList>& migrations()
                            " folder_id TEXT REFERENCES folders(id) ON DELETE CASCADE)"),
             QStringLiteral("CREATE INDEX dir_entries_by_folder ON dir_entries(folder_id)"),
         },
+        {
+            // Each save counts up; a save that read an older revision is refused.
+            QStringLiteral("ALTER TABLE objects ADD COLUMN revision INTEGER NOT NULL DEFAULT 1"),
+        },
     };
     return steps;
 }

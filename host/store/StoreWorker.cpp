@@ -55,14 +55,14 @@ void StoreWorker::run(std::shared_ptr<QtCommand> command)
 std::shared_ptr<Response> StoreWorker::execute(Command& command, std::shared_ptr<ErrorInfo>& error)
 {
     const QString what = QString::fromStdString(command.description());
-    const auto fail = [&](const QString& cause) {
-        error = std::make_shared<ErrorInfo>(QStringLiteral("Cannot %1: %2").arg(what, cause));
+    const auto fail = [&](const QString& cause, bool conflict = false) {
+        error = std::make_shared<ErrorInfo>(QStringLiteral("Cannot %1: %2").arg(what, cause), conflict);
         return nullptr;
     };
     try {
         return command.execute(*m_database);
     } catch (const StoreError& failure) {
-        return fail(QString::fromUtf8(failure.what()));
+        return fail(QString::fromUtf8(failure.what()), failure.isConflict());
     } catch (const DecodeError& failure) {
         return fail(QStringLiteral("the stored object is damaged (%1): %2").arg(QString::fromUtf8(failure.what()), m_path));
     } catch (const std::exception& failure) {

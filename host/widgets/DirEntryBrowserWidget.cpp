@@ -6,6 +6,7 @@
 #include "host/widgets/FolderCommands.h"
 #include "host/widgets/ObjectTypeNames.h"
 #include "host/widgets/TreePickerDialog.h"
+#include "host/widgets/UserAsker.h"
 #include "host/domain/NamedObject.h"
 #include "host/store/MarloModel.h"
 
@@ -142,6 +143,9 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     connect(m_tree->selectionModel(), &QItemSelectionModel::selectionChanged, this,
             &DirEntryBrowserWidget::onTreeSelectionChanged);
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+    // Queued: the question is not asked inside the save's answer.
+    connect(m_model, &DirEntryTreeModel::sgSaveConflict, this, &DirEntryBrowserWidget::resolveSaveConflict,
+            Qt::QueuedConnection);
     // Every reload rebuilds the nodes; the view keeps its open folders and selection.
     connect(m_model, &QAbstractItemModel::modelAboutToBeReset, this, &DirEntryBrowserWidget::keepViewState);
     connect(m_model, &QAbstractItemModel::modelReset, this, &DirEntryBrowserWidget::restoreViewState);
@@ -364,6 +368,39 @@ void DirEntryBrowserWidget::saveCurrentObject()
         rememberSelection();
         updateActions();
     });
+}
+
+void DirEntryBrowserWidget::resolveSaveConflict(quint64 serial, const QString& message)
+{
+    auto* node = dynamic_cast<DirEntryNode*>(m_model->findBySerial(serial));
+    if (!node || !node->object()) {
+        showError(message);
+        return;
+    }
+    const QString question = message + QStringLiteral("\n\n")
+        + tr("Save your edit as a copy beside it, or reload the stored version and drop your edit? "
+             "Cancel keeps your edit open, unsaved.");
+    const std::optional<int> choice = m_folderCommands->asker()->choose(
+        this, tr("Changed elsewhere"), question, {tr("Save as &Copy"), tr("&Reload")}, 0);
+    if (!choice)
+        return;
+    if (*choice == 1) {
+        reloadStored(serial);
+        return;
+    }
+    // The stored version is read again only once the copy is safe.
+    m_model->saveCopy(node, [this, self = QPointer<DirEntryBrowserWidget>(this), serial](bool saved) {
+        if (self && saved)
+            reloadStored(serial);
+    });
+}
+
+void DirEntryBrowserWidget::reloadStored(quint64 serial)
+{
+    if (auto* node = dynamic_cast<DirEntryNode*>(m_model->findBySerial(serial))) {
+        m_model->discardObject(node);
+        onTreeSelectionChanged();
+    }
 }
 
 bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)

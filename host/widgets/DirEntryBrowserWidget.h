@@ -109,6 +109,10 @@ private:
     void selectNode(BaseObjectTreeModel::Node* node);
     void updateActions();
     void showError(const QString& message);
+    // Another save came between opening the object and saving it: the user
+    // saves the edit as a copy, reloads the stored version, or keeps editing.
+    void resolveSaveConflict(quint64 serial, const QString& message);
+    void reloadStored(quint64 serial);
     void showContextMenu(const QPoint& position);
 
     void createNewObject();

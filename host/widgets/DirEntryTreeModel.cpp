@@ -18,6 +18,10 @@
 #include "host/store/RenameDirItem.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/widgets/FirstFreeName.h"
+
+#include <QUuid>
 
 #include <QIcon>
 
@@ -189,24 +193,62 @@ void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)
     command->setFolderId(node->folderId());
     const quint64 serial = node->serial();
     const quint64 revision = node->revision();
-    run(command, [this, serial, revision](const std::shared_ptr<Response>& response) {
-        auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
-        if (!target)
+    const auto onError = [this, serial, done, fail = failure(done)](const std::shared_ptr<ErrorInfo>& error) {
+        if (!error->isConflict()) {
+            fail(error);
             return;
-        const auto answer = std::dynamic_pointer_cast<UpdateObjectResponse>(response);
-        if (answer && answer->entry() && !target->isSaved())
-            target->setDirEntry(answer->entry());
-        if (target->isSaved())
-            target->dirEntry()->header()->setName(target->object()->name());
-        // An edit made while the save ran is not in the store yet.
-        if (target->revision() == revision)
-            target->setModified(false);
-        nodeChanged(target);
-        if (target->isSaved()) {
-            auto entry = target->dirEntry();
-            emit sgItemChanged(entry);
         }
-    }, done);
+        emit sgSaveConflict(serial, error->message());
+        if (done)
+            done(false);
+    };
+    CommandSender::send(m_store, m_dispatcherId, command, this,
+                        [this, serial, revision, done](const std::shared_ptr<Response>& response) {
+                            applySave(serial, revision, response);
+                            if (done)
+                                done(true);
+                        },
+                        onError);
+}
+
+void DirEntryTreeModel::applySave(quint64 serial, quint64 revision, const std::shared_ptr<Response>& response)
+{
+    auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+    if (!target)
+        return;
+    const auto answer = std::dynamic_pointer_cast<UpdateObjectResponse>(response);
+    if (answer && answer->entry() && !target->isSaved())
+        target->setDirEntry(answer->entry());
+    if (target->isSaved())
+        target->dirEntry()->header()->setName(target->object()->name());
+    // An edit made while the save ran is not in the store yet.
+    if (target->revision() == revision)
+        target->setModified(false);
+    nodeChanged(target);
+    if (target->isSaved()) {
+        auto entry = target->dirEntry();
+        emit sgItemChanged(entry);
+    }
+}
+
+void DirEntryTreeModel::discardObject(DirEntryNode* node)
+{
+    node->setObject(nullptr);
+    node->setModified(false);
+    nodeChanged(node);
+}
+
+void DirEntryTreeModel::saveCopy(DirEntryNode* node, const Done& done)
+{
+    if (!node->object())
+        return;
+    auto copy = std::dynamic_pointer_cast<NamedObject>(ObjectCodec::clone<BaseObject>(*node->object()));
+    if (!copy)
+        return;
+    copy->setId(QUuid::createUuid().toString(QUuid::WithoutBraces).toStdString());
+    Node* folder = node->parent() && node->parent() != root() ? node->parent() : nullptr;
+    copy->setName(firstFreeName(copy->name() + tr(" (copy)").toStdString(), namesIn(folder)));
+    saveObject(addUnsavedObject(folder, copy), done);
 }
 
 void DirEntryTreeModel::createFolder(Node* parentFolder, const std::string& name, const Done& done)

@@ -175,6 +175,8 @@ private slots:
     void renameAndEditDuringSaveAreKept();
     void folderCommandsAskThenAct_data();
     void folderCommandsAskThenAct();
+    void saveConflictOffersCopyOrReload_data();
+    void saveConflictOffersCopyOrReload();
     void editedObjectSurvivesDeletionElsewhere_data();
     void editedObjectSurvivesDeletionElsewhere();
     void deleteQuestionSaysWhatGoes_data();
@@ -508,6 +510,61 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct()
     // What the tree shows is what the store holds.
     Browser restarted(store);
     QTRY_COMPARE(restarted.namesIn(nullptr), topLevel);
+}
+
+void tst_DirEntryBrowser::saveConflictOffersCopyOrReload_data()
+{
+    QTest::addColumn<int>("choice"); // -1: cancel
+    QTest::addColumn<QString>("edited");   // the description of the open object afterwards
+    QTest::addColumn<bool>("modified");
+    QTest::addColumn<bool>("copied");
+    QTest::newRow("save as copy: the edit is a new entry, the original shows the stored version")
+        << 0 << "theirs" << false << true;
+    QTest::newRow("reload: the stored version replaces the edit") << 1 << "theirs" << false << false;
+    QTest::newRow("cancel: the edit stays open, unsaved") << -1 << "mine" << true << false;
+}
+
+// The template is saved elsewhere while it is open here with changes: the
+// save here is refused and the user chooses what becomes of the edit.
+void tst_DirEntryBrowser::saveConflictOffersCopyOrReload()
+{
+    QFETCH(int, choice);
+    QFETCH(QString, edited);
+    QFETCH(bool, modified);
+    QFETCH(bool, copied);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    ScriptedAsker asker;
+    asker.scriptChoice(choice < 0 ? std::nullopt : std::optional<int>(choice));
+    browser.widget.folderCommands()->setAsker(&asker);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    const auto id = browser.find("Door Panel")->object()->id();
+    browser.find("Door Panel")->object()->setDescription("mine");
+    browser.modify("Door Panel");
+    const auto elsewhere = std::static_pointer_cast<NamedObject>(store.fetch(QCJobTemplate::typeId(), id));
+    elsewhere->setDescription("theirs");
+    QVERIFY(store.save(elsewhere));
+
+    browser.widget.actionSave()->trigger();
+    QTRY_COMPARE(asker.asked().size(), 1);
+    QVERIFY2(asker.asked().first().contains(
+                 QStringLiteral("\"Door Panel\" at the top level (id %1) was changed elsewhere since it was opened")
+                     .arg(QString::fromStdString(id))),
+             qPrintable(asker.asked().first()));
+    Node* original = browser.find("Door Panel");
+    QTRY_VERIFY(original->object() && original->object()->description() == edited.toStdString());
+    QCOMPARE(original->isModified(), modified);
+    QTRY_COMPARE(browser.find("Door Panel (copy)") != nullptr, copied);
+    if (copied) {
+        auto* copy = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find("Door Panel (copy)"));
+        QTRY_VERIFY(copy->isSaved() && !copy->isModified());
+        const auto stored = std::static_pointer_cast<NamedObject>(
+            store.fetch(QCJobTemplate::typeId(), copy->object()->id()));
+        QVERIFY(stored && stored->description() == "mine");
+    }
+    const auto stored = std::static_pointer_cast<NamedObject>(store.fetch(QCJobTemplate::typeId(), id));
+    QCOMPARE(QString::fromStdString(stored->description()), QStringLiteral("theirs"));
 }
 
 void tst_DirEntryBrowser::editedObjectSurvivesDeletionElsewhere_data()

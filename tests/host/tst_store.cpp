@@ -30,6 +30,7 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QProcess>
 #include <QScopeGuard>
 #include <QThread>
 #include <QtTest>
@@ -164,6 +165,9 @@ private slots:
     void folderTreeOperations();
     void deletingFolderDeletesItsObjects();
     void folderCycleDoesNotHangTheStore();
+    void staleSaveIsRefusedAndWritesNothing();
+    void twoProgramsSavingOneTemplateOneWins();
+    void storeOfTheFirstSchemaIsUpgraded();
 };
 
 void tst_Store::templateSurvivesRestartByteForByte()
@@ -629,6 +633,117 @@ void tst_Store::folderCycleDoesNotHangTheStore()
     QVERIFY(!tree.timedOut && tree.response);
     QVERIFY(deleteItems(store, {first}));
     QVERIFY(getOne(store, kTemplate, nested->id()).error);
+}
+
+
+// Two editors read the same template; the first saves (twice), the second
+// is refused and nothing of its edit is written; once it has read the
+// stored version again it saves.
+void tst_Store::staleSaveIsRefusedAndWritesNothing()
+{
+    TempStore store;
+    auto original = makeTemplate("Door Panel");
+    QVERIFY(store.save(original));
+    auto first = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    auto second = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    QVERIFY(first && second);
+
+    first->setName("Door Panel A");
+    QVERIFY(!update(store, first).error);
+    first->setName("Door Panel A2");
+    QVERIFY2(!update(store, first).error, "a second save from the same editor states the revision it wrote");
+
+    second->setName("Door Panel B");
+    const auto refused = update(store, second);
+    QVERIFY(refused.error);
+    QVERIFY(refused.error->isConflict());
+    const QString message = refused.error->message();
+    QVERIFY2(message.contains(QStringLiteral("\"Door Panel A2\" (id "))
+                 && message.contains(QStringLiteral("was changed elsewhere since it was opened")),
+             qPrintable(message));
+    QCOMPARE(store.fetch(kTemplate, original->id())->header()->name(), std::string("Door Panel A2"));
+
+    auto reread = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    reread->setName("Door Panel B");
+    QVERIFY(!update(store, reread).error);
+    QCOMPARE(store.fetch(kTemplate, original->id())->header()->name(), std::string("Door Panel B"));
+}
+
+// Two other programs read the template, then save it at the same moment.
+void tst_Store::twoProgramsSavingOneTemplateOneWins()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    QVERIFY(store.save(jobTemplate));
+    const QString saver = QCoreApplication::applicationDirPath() + QStringLiteral("/storesaver");
+    QProcess programs[2];
+    const QStringList names{QStringLiteral("Saved by one"), QStringLiteral("Saved by two")};
+    for (int i = 0; i < 2; ++i) {
+        programs[i].start(saver, {store.path(), QString::fromStdString(kTemplate), QString::fromStdString(jobTemplate->id()),
+                                  names[i]});
+        QVERIFY(programs[i].waitForStarted(5000));
+    }
+    const auto stopAll = qScopeGuard([&programs] {
+        for (QProcess& program : programs) {
+            program.kill();
+            program.waitForFinished(5000);
+        }
+    });
+    for (QProcess& program : programs) {
+        QVERIFY(program.waitForReadyRead(20000));
+        QCOMPARE(program.readLine().trimmed(), QByteArray("read"));
+    }
+    for (QProcess& program : programs)
+        program.write("go\n");
+    QStringList outcomes;
+    for (QProcess& program : programs) {
+        QVERIFY(program.waitForFinished(20000));
+        outcomes << QString::fromUtf8(program.readAllStandardOutput().trimmed());
+    }
+    QCOMPARE(outcomes.count(QStringLiteral("saved")), 1);
+    const int winner = outcomes.indexOf(QStringLiteral("saved"));
+    const QString refusal = outcomes[1 - winner];
+    QVERIFY2(refusal.startsWith(QStringLiteral("refused: Cannot save \"Saved by "))
+                 && refusal.contains(QStringLiteral("was changed elsewhere since it was opened")),
+             qPrintable(refusal));
+    QCOMPARE(QString::fromStdString(store.fetch(kTemplate, jobTemplate->id())->header()->name()), names[winner]);
+}
+
+// A store written before objects had revisions: its objects read and save as before.
+void tst_Store::storeOfTheFirstSchemaIsUpgraded()
+{
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("old.sqlite"));
+    auto jobTemplate = makeTemplate("Door Panel");
+    {
+        RawConnection raw(path);
+        for (const char* statement :
+             {"CREATE TABLE folders(id TEXT PRIMARY KEY, object_type TEXT NOT NULL,"
+              " parent_id TEXT REFERENCES folders(id) ON DELETE CASCADE, name TEXT NOT NULL)",
+              "CREATE TABLE objects(id TEXT PRIMARY KEY, type TEXT NOT NULL, name TEXT NOT NULL, data BLOB NOT NULL)",
+              "CREATE TABLE dir_entries(id TEXT PRIMARY KEY,"
+              " object_id TEXT NOT NULL UNIQUE REFERENCES objects(id) ON DELETE CASCADE,"
+              " folder_id TEXT REFERENCES folders(id) ON DELETE CASCADE)",
+              "PRAGMA user_version = 1"})
+            QVERIFY(raw.exec(QString::fromLatin1(statement)));
+        QVERIFY(raw.exec(QStringLiteral("PRAGMA application_id = %1").arg(StoreDatabase::kApplicationId)));
+        QVERIFY(raw.exec(QStringLiteral("INSERT INTO objects VALUES(?, ?, ?, ?)"),
+                         {QString::fromStdString(jobTemplate->id()), QString::fromStdString(kTemplate),
+                          QStringLiteral("Door Panel"), ObjectCodec::serialize(*jobTemplate)}));
+    }
+    MarloModel model(path);
+    QCOMPARE(model.open(), QString());
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(kTemplate);
+    get->setId(jobTemplate->id());
+    const auto fetched = std::dynamic_pointer_cast<GetMarloObjectResponse>(
+        CommandSender::sendAndWait(model, std::string(), get, 20000).response);
+    QVERIFY(fetched && fetched->object());
+    QCOMPARE(fetched->object()->storedRevision(), std::int64_t(1));
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(fetched->object());
+    QVERIFY(!CommandSender::sendAndWait(model, std::string(), save, 20000).error);
+    QCOMPARE(RawConnection(path).scalar(QStringLiteral("PRAGMA user_version")).toInt(), StoreDatabase::schemaVersion());
 }
 
 QC_TEST_GUILESS_MAIN(tst_Store)
