@@ -41,9 +41,12 @@ void StoreWorker::run(std::shared_ptr<QtCommand> command)
     std::shared_ptr<ErrorInfo> error;
     std::shared_ptr<Response> response;
     const QString openError = ensureOpen();
-    if (openError.isEmpty())
+    if (openError.isEmpty()) {
         response = execute(*command->command(), error);
-    else
+        // The next command connects anew, e.g. to a server that is back.
+        if (m_database->isConnectionLost())
+            m_database.reset();
+    } else
         error = std::make_shared<ErrorInfo>(openError);
     // The handle moves into the delivery: the worker keeps none of its own.
     if (error)

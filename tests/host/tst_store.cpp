@@ -22,6 +22,7 @@
 #include "host/store/QtCommand.h"
 #include "host/store/RenameDirItem.h"
 #include "host/domain/SchematicImage.h"
+#include "host/store/SqliteDialect.h"
 #include "host/store/StoreDatabase.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
@@ -549,7 +550,7 @@ void tst_Store::explainsSqliteFailures()
     QFETCH(int, code);
     QFETCH(bool, diskFull);
     QFETCH(QString, expected);
-    const QString explained = StoreDatabase::explain(code, diskFull);
+    const QString explained = SqliteDialect::explain(code, diskFull);
     QVERIFY2(expected.isEmpty() ? explained.isEmpty() : explained.contains(expected), qPrintable(explained));
 }
 
