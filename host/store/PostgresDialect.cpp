@@ -64,7 +64,6 @@ bool isLockTimeout(const QString& state)
 void PostgresDialect::connect(const QString& connectionName, const StoreOptions& options)
 {
     m_lockTimeoutMs = options.busyTimeoutMs;
-    const Address address = parse(m_address);
     QSqlDatabase database = QSqlDatabase::database(connectionName, false);
     if (!database.isValid())
         database = QSqlDatabase::addDatabase(QStringLiteral("QPSQL"), connectionName);
@@ -72,16 +71,22 @@ void PostgresDialect::connect(const QString& connectionName, const StoreOptions&
         throw StoreError("the PostgreSQL driver for Qt is not installed (package libqt5sql5-psql): "
                          + m_address.toStdString());
     database.close();
-    // The driver quotes each part into libpq's connection string.
-    database.setHostName(address.host);
-    if (address.port > 0)
-        database.setPort(address.port);
-    database.setUserName(address.user);
-    database.setDatabaseName(address.database);
+    applyAddress(database, m_address);
     const int timeoutSeconds = qMax(2, options.busyTimeoutMs / 1000);
     database.setConnectOptions(QStringLiteral("connect_timeout=%1;application_name=qchost").arg(timeoutSeconds));
     if (!database.open())
         throw StoreError(describeConnectFailure(database.lastError()).toStdString());
+}
+
+void PostgresDialect::applyAddress(QSqlDatabase& database, const QString& address)
+{
+    const Address parts = parse(address);
+    // The driver quotes each part into libpq's connection string.
+    database.setHostName(parts.host);
+    if (parts.port > 0)
+        database.setPort(parts.port);
+    database.setUserName(parts.user);
+    database.setDatabaseName(parts.database);
 }
 
 void PostgresDialect::configure(StoreDatabase& database, const StoreOptions& options)

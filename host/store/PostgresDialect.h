@@ -2,6 +2,8 @@
 
 #include "host/store/StoreDialect.h"
 
+class QSqlDatabase;
+
 namespace vemi {
 
 // A store in a database on a PostgreSQL server, named by an address such as
@@ -15,6 +17,10 @@ class PostgresDialect : public StoreDialect
 {
 public:
     explicit PostgresDialect(QString address) : m_address(std::move(address)) {}
+
+    // Sets the connection's host, port, user and database from the address;
+    // throws StoreError for an address that is not valid or holds a password.
+    static void applyAddress(QSqlDatabase& database, const QString& address);
 
     void connect(const QString& connectionName, const StoreOptions& options) override;
     void configure(StoreDatabase& database, const StoreOptions& options) override;

@@ -133,6 +133,13 @@ QSqlQuery StoreDatabase::run(const QString& sql, const QVariantList& bindings)
         m_connectionLost = m_connectionLost || m_dialect->isConnectionLost(error);
         return StoreError(describe(error).toStdString(), error.nativeErrorCode().toInt());
     };
+    // Statements without bindings run as they stand: a server cannot prepare
+    // some of them (BEGIN, SET).
+    if (bindings.isEmpty()) {
+        if (!query.exec(sql))
+            throw fail(query.lastError());
+        return query;
+    }
     if (!query.prepare(sql))
         throw fail(query.lastError());
     for (const QVariant& value : bindings)

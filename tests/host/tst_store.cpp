@@ -2,6 +2,7 @@
 #include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
 #include "tests/common/TestLibrary.h"
+#include "tests/common/TestPostgresServer.h"
 
 #include "host/store/CommandDispatcher.h"
 #include "host/store/CreateFolder.h"
@@ -140,13 +141,37 @@ QStringList namesOf(const std::vector<std::shared_ptr<Object>>& objects)
     return names;
 }
 
+bool onServer()
+{
+    return TempStore::backend() == TempStore::Backend::Postgres;
+}
+
+// What another program runs to hold the store's write lock.
+QStringList writeLockStatements()
+{
+    if (onServer())
+        return {QStringLiteral("BEGIN"),
+                QStringLiteral("SELECT pg_advisory_xact_lock(%1)").arg(StoreDatabase::kApplicationId)};
+    return {QStringLiteral("BEGIN EXCLUSIVE")};
+}
+
 } // namespace
+
+#define SQLITE_FILES_ONLY()                                                                                    \
+    if (onServer())                                                                                            \
+        QSKIP("about SQLite files only");
 
 class tst_Store : public QObject
 {
     Q_OBJECT
 
+    void refusesDatabasesThatAreNotStores(const QString& setup, const QString& expected);
+
 private slots:
+    // Every test runs on both kinds of store: an SQLite file, and a database
+    // on a PostgreSQL server that the tests start.
+    void initTestCase_data();
+    void init();
     void templateSurvivesRestartByteForByte();
     void commandsRunInOrderOffTheCallersThread();
     void droppedWrapperAnswersAndDiesAtHome();
@@ -170,6 +195,21 @@ private slots:
     void twoProgramsSavingOneTemplateOneWins();
     void storeOfTheFirstSchemaIsUpgraded();
 };
+
+void tst_Store::initTestCase_data()
+{
+    QTest::addColumn<bool>("server");
+    QTest::newRow("SQLite") << false;
+    QTest::newRow("PostgreSQL") << true;
+}
+
+void tst_Store::init()
+{
+    QFETCH_GLOBAL(bool, server);
+    TempStore::setBackend(server ? TempStore::Backend::Postgres : TempStore::Backend::Sqlite);
+    if (server && !TestPostgresServer::shared())
+        QSKIP(qPrintable(QStringLiteral("no PostgreSQL test server: ") + TestPostgresServer::skipReason()));
+}
 
 void tst_Store::templateSurvivesRestartByteForByte()
 {
@@ -269,6 +309,10 @@ void tst_Store::refusesFilesThatAreNotStores()
 {
     QFETCH(QString, setup);
     QFETCH(QString, expected);
+    if (onServer()) {
+        refusesDatabasesThatAreNotStores(setup, expected);
+        return;
+    }
     QTemporaryDir dir;
     const QString path = dir.filePath(QStringLiteral("file.sqlite"));
     if (setup == QLatin1String("text")) {
@@ -296,6 +340,31 @@ void tst_Store::refusesFilesThatAreNotStores()
     QCOMPARE(original.readAll(), before);
 }
 
+// The same checks for a database on the server; nothing is created in it.
+void tst_Store::refusesDatabasesThatAreNotStores(const QString& setup, const QString& expected)
+{
+    if (setup == QLatin1String("text"))
+        QSKIP("a text file is about SQLite files only");
+    const QString address = TestPostgresServer::shared()->createDatabase();
+    if (setup == QLatin1String("unversioned")) {
+        QVERIFY(MarloModel(address).open().isEmpty());
+        QVERIFY(RawConnection(address).exec(QStringLiteral("UPDATE store_mark SET schema_version = 0")));
+    } else if (setup == QLatin1String("foreign")) {
+        QVERIFY(RawConnection(address).exec(QStringLiteral("CREATE TABLE people(name TEXT)")));
+    } else {
+        RawConnection raw(address);
+        QVERIFY(raw.exec(QStringLiteral("CREATE TABLE store_mark(application_id INTEGER, schema_version INTEGER)")));
+        QVERIFY(raw.exec(QStringLiteral("INSERT INTO store_mark VALUES(?, 99)"), {StoreDatabase::kApplicationId}));
+    }
+    const QString tables = QStringLiteral("SELECT string_agg(table_name, ',' ORDER BY table_name)"
+                                          " FROM information_schema.tables WHERE table_schema = 'public'");
+    const QString before = RawConnection(address).scalar(tables).toString();
+
+    const QString error = MarloModel(address).open();
+    QVERIFY2(error.contains(expected) && error.contains(address), qPrintable(error));
+    QCOMPARE(RawConnection(address).scalar(tables).toString(), before);
+}
+
 void tst_Store::refusedWriteIsReportedAndChangesNothing_data()
 {
     QTest::addColumn<bool>("readOnly");
@@ -318,7 +387,8 @@ void tst_Store::refusedWriteIsReportedAndChangesNothing()
         store.reopenReadOnly();
     } else {
         other.emplace(store.path());
-        QVERIFY(other->exec(QStringLiteral("BEGIN EXCLUSIVE")));
+        for (const QString& statement : writeLockStatements())
+            QVERIFY(other->exec(statement));
     }
     jobTemplate->setName("Changed");
 
@@ -470,6 +540,7 @@ void tst_Store::contentOfAnotherTypeIsDamaged()
 // read-only open must do without them where the folder cannot be written.
 void tst_Store::readOnlyOpenInFolderNobodyMayWrite()
 {
+    SQLITE_FILES_ONLY();
     QTemporaryDir folder;
     const QString path = folder.filePath(QStringLiteral("store.sqlite"));
     {
@@ -511,6 +582,7 @@ void tst_Store::readOnlyOpenInFolderNobodyMayWrite()
 // read-only open that skipped the -wal file would still see the object.
 void tst_Store::readOnlyOpenSeesChangesNotYetMerged()
 {
+    SQLITE_FILES_ONLY();
     TempStore store;
     auto removed = makeTemplate("Removed");
     QVERIFY(store.save(makeTemplate("Kept")));
@@ -547,6 +619,7 @@ void tst_Store::explainsSqliteFailures_data()
 
 void tst_Store::explainsSqliteFailures()
 {
+    SQLITE_FILES_ONLY();
     QFETCH(int, code);
     QFETCH(bool, diskFull);
     QFETCH(QString, expected);
@@ -713,6 +786,7 @@ void tst_Store::twoProgramsSavingOneTemplateOneWins()
 // A store written before objects had revisions: its objects read and save as before.
 void tst_Store::storeOfTheFirstSchemaIsUpgraded()
 {
+    SQLITE_FILES_ONLY();
     QTemporaryDir dir;
     const QString path = dir.filePath(QStringLiteral("old.sqlite"));
     auto jobTemplate = makeTemplate("Door Panel");
