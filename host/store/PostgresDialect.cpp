@@ -24,7 +24,7 @@ struct Address
 
 Address parse(const QString& text)
 {
-    const QUrl url(text, QUrl::StrictMode);
+    const QUrl url(text, QUrl::TolerantMode);
     if (!url.isValid())
         throw StoreError("the server address is not valid (" + url.errorString().toStdString() + "): "
                          + text.toStdString());

@@ -166,7 +166,8 @@ void TestPostgresServer::startWatchdog()
 QString TestPostgresServer::addressAs(const QString& user, const QString& database) const
 {
     return QStringLiteral("postgresql://%1@localhost/%2?host=%3")
-        .arg(user, database, QString::fromLatin1(QUrl::toPercentEncoding(m_dir.path())));
+        .arg(QString::fromLatin1(QUrl::toPercentEncoding(user)), QString::fromLatin1(QUrl::toPercentEncoding(database)),
+             QString::fromLatin1(QUrl::toPercentEncoding(m_dir.path())));
 }
 
 QString TestPostgresServer::createDatabase()

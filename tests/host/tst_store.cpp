@@ -35,6 +35,7 @@
 #include <QProcess>
 #include <QScopeGuard>
 #include <QThread>
+#include <QUrl>
 #include <QtTest>
 
 #include <optional>
@@ -157,6 +158,10 @@ QStringList writeLockStatements()
 
 } // namespace
 
+#define SERVERS_ONLY()                                                                                         \
+    if (!onServer())                                                                                           \
+        QSKIP("about servers only");
+
 #define SQLITE_FILES_ONLY()                                                                                    \
     if (onServer())                                                                                            \
         QSKIP("about SQLite files only");
@@ -194,6 +199,9 @@ private slots:
     void staleSaveIsRefusedAndWritesNothing();
     void twoProgramsSavingOneTemplateOneWins();
     void storeOfTheFirstSchemaIsUpgraded();
+    void serverFailuresNameServerAndCause_data();
+    void serverFailuresNameServerAndCause();
+    void serverGoneDuringSaveLosesNothingAcknowledged();
 };
 
 void tst_Store::initTestCase_data()
@@ -819,6 +827,78 @@ void tst_Store::storeOfTheFirstSchemaIsUpgraded()
     save->setObject(fetched->object());
     QVERIFY(!CommandSender::sendAndWait(model, std::string(), save, 20000).error);
     QCOMPARE(RawConnection(path).scalar(QStringLiteral("PRAGMA user_version")).toInt(), StoreDatabase::schemaVersion());
+}
+
+void tst_Store::serverFailuresNameServerAndCause_data()
+{
+    QTest::addColumn<QString>("user");
+    QTest::addColumn<QString>("socketFolder"); // empty: the test server's
+    QTest::addColumn<QString>("cause");
+    QTest::newRow("no server at the address") << "postgres" << "/nonexistent-socket-folder" << "cannot be reached";
+    QTest::newRow("a user the server does not know") << "nobody here" << "" << "refused the login";
+    QTest::newRow("quotes and semicolons stay in the user name")
+        << "x'; DROP TABLE objects; --" << "" << "refused the login";
+    QTest::newRow("a password in the address is refused, not sent") << "postgres:secret" << "" << "~/.pgpass";
+}
+
+void tst_Store::serverFailuresNameServerAndCause()
+{
+    SERVERS_ONLY();
+    QFETCH(QString, user);
+    QFETCH(QString, socketFolder);
+    QFETCH(QString, cause);
+    TempStore store;
+    const auto kept = makeTemplate("Kept");
+    QVERIFY(store.save(kept));
+    QUrl address(TestPostgresServer::shared()->addressAs(user.section(QLatin1Char(':'), 0, 0),
+                                                         QUrl(store.path()).path().mid(1)));
+    address.setPassword(user.section(QLatin1Char(':'), 1));
+    if (!socketFolder.isEmpty())
+        address.setQuery(QStringLiteral("host=") + socketFolder);
+    const QString text = address.toString(QUrl::FullyEncoded);
+
+    const QString error = MarloModel(text).open();
+    const bool named = address.password().isEmpty() ? error.contains(text) : !error.contains(QLatin1String("secret"));
+    QVERIFY2(error.contains(cause) && named, qPrintable(error));
+    QVERIFY(store.fetch(kTemplate, kept->id()));
+}
+
+// The server stops while a save of a large template is under way: either the
+// save was acknowledged and is there once the server is back, or it failed,
+// saying why, and saving again then succeeds.
+void tst_Store::serverGoneDuringSaveLosesNothingAcknowledged()
+{
+    SERVERS_ONLY();
+    TestPostgresServer* server = TestPostgresServer::shared();
+    const auto restart = qScopeGuard([server] { server->start(); });
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel", 10 << 20);
+    QVERIFY(store.save(jobTemplate));
+    jobTemplate->setName("Door Panel, changed");
+    std::optional<TempStore::Answer> answer;
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(jobTemplate);
+    QObject context;
+    CommandSender::send(store.model(), std::string(), save, &context,
+                        [&answer](const std::shared_ptr<Response>& response) { answer = TempStore::Answer{response, nullptr}; },
+                        [&answer](const std::shared_ptr<ErrorInfo>& error) { answer = TempStore::Answer{{}, error}; });
+    QVERIFY(server->kill());
+    QTRY_VERIFY_WITH_TIMEOUT(answer.has_value(), 20000);
+    qInfo("the save %s", answer->error ? "failed" : "was acknowledged");
+    if (answer->error) {
+        QVERIFY2(answer->error->message().contains(store.path()), qPrintable(answer->error->message()));
+        const auto whileDown = update(store, jobTemplate);
+        QVERIFY(whileDown.error);
+        QVERIFY2(whileDown.error->message().contains(QStringLiteral("cannot be reached"))
+                     || whileDown.error->message().contains(QStringLiteral("connection to the server was lost")),
+                 qPrintable(whileDown.error->message()));
+    }
+    QVERIFY(server->start());
+    if (answer->error)
+        QVERIFY(store.save(jobTemplate));
+    const auto stored = store.fetch(kTemplate, jobTemplate->id());
+    QVERIFY(stored);
+    QCOMPARE(ObjectCodec::serialize(*stored), ObjectCodec::serialize(*jobTemplate));
 }
 
 QC_TEST_GUILESS_MAIN(tst_Store)
