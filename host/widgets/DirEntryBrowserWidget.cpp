@@ -501,8 +501,21 @@ QString DirEntryBrowserWidget::nameList(const QStringList& names)
 
 void DirEntryBrowserWidget::refresh()
 {
-    if (m_model)
-        m_model->load();
+    if (!m_model)
+        return;
+    // Objects saved elsewhere were dropped from the tree: the selected ones
+    // are read again and handed to the client.
+    m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this)](bool ok) {
+        if (!self || !ok)
+            return;
+        const auto nodes = selectedNodes();
+        const bool dropped = std::any_of(nodes.begin(), nodes.end(), [](Node* node) {
+            auto* entry = dynamic_cast<DirEntryNode*>(node);
+            return entry && entry->isSaved() && !entry->object();
+        });
+        if (dropped)
+            onTreeSelectionChanged();
+    });
 }
 
 void DirEntryBrowserWidget::keepViewState()

@@ -64,7 +64,8 @@ public:
     void createCustomMenus(QMenu* menu, const QString& singular, const QString& plural, bool withFolderActions);
 
     // Reads the tree again from the store; unsaved work, open folders and the
-    // selection are kept.
+    // selection are kept. Unchanged objects that were saved elsewhere
+    // meanwhile are read again.
     void refresh();
     // Asks Save / Discard / Cancel when objects are unsaved; true when the
     // browser may close (everything saved or the user chose to discard).

@@ -28,6 +28,8 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QTreeView>
+#include <QProcess>
+#include <QSignalSpy>
 #include <QtTest>
 
 using namespace vemi;
@@ -175,6 +177,8 @@ private slots:
     void renameAndEditDuringSaveAreKept();
     void folderCommandsAskThenAct_data();
     void folderCommandsAskThenAct();
+    void refreshFindsChangesOfAnotherProgram_data();
+    void refreshFindsChangesOfAnotherProgram();
     void saveConflictOffersCopyOrReload_data();
     void saveConflictOffersCopyOrReload();
     void editedObjectSurvivesDeletionElsewhere_data();
@@ -510,6 +514,47 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct()
     // What the tree shows is what the store holds.
     Browser restarted(store);
     QTRY_COMPARE(restarted.namesIn(nullptr), topLevel);
+}
+
+void tst_DirEntryBrowser::refreshFindsChangesOfAnotherProgram_data()
+{
+    QTest::addColumn<bool>("changedHere");
+    QTest::newRow("unchanged here: the stored version is read and handed on") << false;
+    QTest::newRow("changed here: the edit is kept") << true;
+}
+
+void tst_DirEntryBrowser::refreshFindsChangesOfAnotherProgram()
+{
+    QFETCH(bool, changedHere);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    auto* node = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find("Door Panel"));
+    const auto opened = node->object();
+    if (changedHere)
+        browser.modify("Door Panel");
+    QProcess other;
+    other.start(QCoreApplication::applicationDirPath() + QStringLiteral("/storesaver"),
+                {store.path(), QString::fromStdString(QCJobTemplate::typeId()), QString::fromStdString(opened->id()),
+                 QStringLiteral("Door Panel, theirs")});
+    QVERIFY(other.waitForStarted(5000));
+    other.write("go\n");
+    QVERIFY(other.waitForFinished(20000));
+    QCOMPARE(other.readAllStandardOutput(), QByteArray("read\nsaved\n"));
+    QSignalSpy handedOn(&browser.widget, &DirEntryBrowserWidget::sgSelectionChanged);
+
+    browser.widget.refresh();
+    QTRY_COMPARE(node->dirEntry()->header()->name(), std::string("Door Panel, theirs"));
+    if (changedHere) {
+        QCOMPARE(node->object(), opened);
+        QVERIFY(node->isModified());
+        return;
+    }
+    QTRY_VERIFY(node->object() && node->object() != opened);
+    QCOMPARE(node->object()->name(), std::string("Door Panel, theirs"));
+    QTRY_VERIFY(!handedOn.isEmpty());
+    QCOMPARE(handedOn.last().first().value<QVector<Node*>>(), QVector<Node*>{node});
 }
 
 void tst_DirEntryBrowser::saveConflictOffersCopyOrReload_data()
