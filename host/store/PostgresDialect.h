@@ -30,6 +30,7 @@ public:
     QStringList beginWrite() const override;
     QString describe(const QSqlError& error) const override;
     bool isConnectionLost(const QSqlError& error) const override;
+    QString changeChannel() const override { return QStringLiteral("qcjt_store_changed"); }
     std::string noun() const override { return "database"; }
 
 private:

@@ -4,6 +4,7 @@
 #include "host/store/StoreError.h"
 
 #include <QSqlDatabase>
+#include <QSqlDriver>
 #include <QSqlError>
 #include <QStringList>
 
@@ -162,12 +163,30 @@ void StoreDatabase::writeTransaction(const std::function<void()>& body)
         for (const QString& statement : begin)
             run(statement, {});
         body();
+        // Delivered to the listeners when, and only if, the write commits.
+        if (!m_dialect->changeChannel().isEmpty())
+            run(QStringLiteral("NOTIFY ") + m_dialect->changeChannel(), {});
         run(QStringLiteral("COMMIT"), {});
     } catch (...) {
         QSqlQuery rollback(QSqlDatabase::database(m_connectionName, false));
         rollback.exec(QStringLiteral("ROLLBACK"));
         throw;
     }
+}
+
+bool StoreDatabase::watchChanges(QObject* context, const std::function<void()>& onChange)
+{
+    const QString channel = m_dialect->changeChannel();
+    QSqlDriver* driver = QSqlDatabase::database(m_connectionName, false).driver();
+    if (channel.isEmpty() || !driver || !driver->subscribeToNotification(channel))
+        return false;
+    QObject::connect(driver, QOverload<const QString&, QSqlDriver::NotificationSource, const QVariant&>::of(
+                                 &QSqlDriver::notification),
+                     context, [onChange](const QString&, QSqlDriver::NotificationSource source, const QVariant&) {
+                         if (source != QSqlDriver::SelfSource)
+                             onChange();
+                     });
+    return true;
 }
 
 QString StoreDatabase::describe(const QSqlError& error) const

@@ -50,6 +50,9 @@ public:
     void writeTransaction(const std::function<void()>& body);
 
     QString describe(const QSqlError& error) const;
+    // Calls onChange (on this thread) whenever another connection announces
+    // a write; false where the store announces none.
+    bool watchChanges(QObject* context, const std::function<void()>& onChange);
     // A statement failed because the connection broke (a server that went
     // away): the connection is of no further use.
     bool isConnectionLost() const { return m_connectionLost; }

@@ -46,6 +46,9 @@ public:
     virtual QStringList beginWrite() const = 0;
     // The failure in words a person can act on, ending with the store's name.
     virtual QString describe(const QSqlError& error) const = 0;
+    // The channel on which every write is announced to the store's other
+    // users; empty where there is none (a file).
+    virtual QString changeChannel() const { return {}; }
     // Whether the failure broke the connection (a server that went away), so
     // that the next command must connect anew.
     virtual bool isConnectionLost(const QSqlError&) const { return false; }

@@ -28,6 +28,7 @@ QString StoreWorker::ensureOpen()
         return QString::fromStdString(error.what());
     }
     m_database = std::move(database);
+    m_database->watchChanges(this, [this] { emit sgStoreChanged(); });
     return {};
 }
 

@@ -20,6 +20,7 @@
 #include <QPointer>
 #include <QPushButton>
 #include <QStyle>
+#include <QTimer>
 #include <QTreeView>
 #include <QVBoxLayout>
 
@@ -143,6 +144,7 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     connect(m_tree->selectionModel(), &QItemSelectionModel::selectionChanged, this,
             &DirEntryBrowserWidget::onTreeSelectionChanged);
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+    connect(m_model, &DirEntryTreeModel::sgStoreChanged, this, &DirEntryBrowserWidget::refreshSoon);
     // Queued: the question is not asked inside the save's answer.
     connect(m_model, &DirEntryTreeModel::sgSaveConflict, this, &DirEntryBrowserWidget::resolveSaveConflict,
             Qt::QueuedConnection);
@@ -515,6 +517,18 @@ void DirEntryBrowserWidget::refresh()
         });
         if (dropped)
             onTreeSelectionChanged();
+    });
+}
+
+// A burst of changes elsewhere (a folder of objects saved at once) makes one refresh.
+void DirEntryBrowserWidget::refreshSoon()
+{
+    if (m_refreshPending)
+        return;
+    m_refreshPending = true;
+    QTimer::singleShot(kRefreshDelayMs, this, [this] {
+        m_refreshPending = false;
+        refresh();
     });
 }
 

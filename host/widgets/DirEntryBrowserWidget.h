@@ -114,6 +114,7 @@ private:
     // saves the edit as a copy, reloads the stored version, or keeps editing.
     void resolveSaveConflict(quint64 serial, const QString& message);
     void reloadStored(quint64 serial);
+    void refreshSoon();
     void showContextMenu(const QPoint& position);
 
     void createNewObject();
@@ -145,6 +146,8 @@ private:
     QString m_plural;
     bool m_writable = true;
     quint64 m_selectionGeneration = 0;
+    static constexpr int kRefreshDelayMs = 200;
+    bool m_refreshPending = false;
     quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
 };
 

@@ -1,5 +1,6 @@
 #include "host/widgets/DirEntryTreeModel.h"
 
+#include "host/store/CommandDispatcher.h"
 #include "host/store/CommandSender.h"
 #include "host/store/CreateFolder.h"
 #include "host/store/DeleteDirItems.h"
@@ -75,6 +76,9 @@ std::string DirEntryTreeModel::folderIdOf(const Node* folder)
 
 void DirEntryTreeModel::load(const Done& done)
 {
+    if (const auto dispatcher = m_store.commandDispatcher(m_dispatcherId))
+        connect(dispatcher.get(), &CommandDispatcher::sgStoreChanged, this, &DirEntryTreeModel::sgStoreChanged,
+                Qt::UniqueConnection);
     run(std::make_shared<GetDirectoryTree>(m_objectType),
         [this](const std::shared_ptr<Response>& response) {
             if (const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response))

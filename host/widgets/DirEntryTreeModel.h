@@ -97,6 +97,8 @@ public:
 signals:
     void sgErrorOccurred(QString message);
     void sgItemChanged(std::shared_ptr<vemi::DirEntry>& entry);
+    // Another program changed the store (see CommandDispatcher::sgStoreChanged).
+    void sgStoreChanged();
     // The save of the node with this serial was refused: message says why.
     void sgSaveConflict(quint64 serial, QString message);
 

@@ -2,6 +2,10 @@
 #include "tests/common/ModalAnswer.h"
 #include "tests/common/RawConnection.h"
 #include "tests/common/ScriptedAsker.h"
+#include "host/store/CommandSender.h"
+#include "host/store/UpdateObject.h"
+#include "host/domain/ObjectCodec.h"
+#include "tests/common/TestPostgresServer.h"
 #include "tests/common/TempStore.h"
 
 #include "host/store/CreateFolder.h"
@@ -29,6 +33,7 @@
 #include <QScreen>
 #include <QTreeView>
 #include <QProcess>
+#include <QScopeGuard>
 #include <QSignalSpy>
 #include <QtTest>
 
@@ -177,6 +182,7 @@ private slots:
     void renameAndEditDuringSaveAreKept();
     void folderCommandsAskThenAct_data();
     void folderCommandsAskThenAct();
+    void serverChangesRefreshTheBrowser();
     void refreshFindsChangesOfAnotherProgram_data();
     void refreshFindsChangesOfAnotherProgram();
     void saveConflictOffersCopyOrReload_data();
@@ -514,6 +520,31 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct()
     // What the tree shows is what the store holds.
     Browser restarted(store);
     QTRY_COMPARE(restarted.namesIn(nullptr), topLevel);
+}
+
+// On a server the browser hears of another program's saves by itself.
+void tst_DirEntryBrowser::serverChangesRefreshTheBrowser()
+{
+    if (!TestPostgresServer::shared())
+        QSKIP(qPrintable(QStringLiteral("no PostgreSQL test server: ") + TestPostgresServer::skipReason()));
+    TempStore::setBackend(TempStore::Backend::Postgres);
+    const auto sqliteAgain = qScopeGuard([] { TempStore::setBackend(TempStore::Backend::Sqlite); });
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    const auto opened = browser.find("Door Panel")->object();
+    MarloModel other(store.path());
+    QCOMPARE(other.open(), QString());
+    auto theirs = std::static_pointer_cast<NamedObject>(ObjectCodec::clone<BaseObject>(*opened));
+    theirs->setStoredRevision(opened->storedRevision());
+    theirs->setName("Door Panel, theirs");
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(theirs);
+    QVERIFY(!CommandSender::sendAndWait(other, std::string(), save, 20000).error);
+
+    QTRY_VERIFY_WITH_TIMEOUT(browser.find("Door Panel, theirs") && browser.find("Door Panel, theirs")->object(), 10000);
+    QVERIFY(browser.find("Door Panel, theirs")->object() != opened);
 }
 
 void tst_DirEntryBrowser::refreshFindsChangesOfAnotherProgram_data()

@@ -34,6 +34,7 @@
 #include <QFileInfo>
 #include <QProcess>
 #include <QScopeGuard>
+#include <QSignalSpy>
 #include <QThread>
 #include <QUrl>
 #include <QtTest>
@@ -202,6 +203,7 @@ private slots:
     void serverFailuresNameServerAndCause_data();
     void serverFailuresNameServerAndCause();
     void serverGoneDuringSaveLosesNothingAcknowledged();
+    void serverAnnouncesWritesOfOthers();
 };
 
 void tst_Store::initTestCase_data()
@@ -899,6 +901,32 @@ void tst_Store::serverGoneDuringSaveLosesNothingAcknowledged()
     const auto stored = store.fetch(kTemplate, jobTemplate->id());
     QVERIFY(stored);
     QCOMPARE(ObjectCodec::serialize(*stored), ObjectCodec::serialize(*jobTemplate));
+}
+
+// Each write of another program is announced; the store's own are not.
+void tst_Store::serverAnnouncesWritesOfOthers()
+{
+    SERVERS_ONLY();
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    QVERIFY(store.save(jobTemplate));
+    QSignalSpy announced(store.model().commandDispatcher(std::string()).get(), &CommandDispatcher::sgStoreChanged);
+    MarloModel other(store.path());
+    QCOMPARE(other.open(), QString());
+    const auto saveElsewhere = [&other](const std::shared_ptr<BaseObject>& object) {
+        auto save = std::make_shared<UpdateObject>();
+        save->setObject(object);
+        return !CommandSender::sendAndWait(other, std::string(), save, 20000).error;
+    };
+
+    QVERIFY(saveElsewhere(makeTemplate("Bonnet")));
+    QTRY_COMPARE_WITH_TIMEOUT(announced.count(), 1, 10000);
+    jobTemplate->setName("Door Panel, changed here");
+    QVERIFY(store.save(jobTemplate));
+    QVERIFY(saveElsewhere(makeTemplate("Bumper")));
+    // Announcements come in the order of the writes: the own one came first.
+    QTRY_VERIFY_WITH_TIMEOUT(announced.count() >= 2, 10000);
+    QCOMPARE(announced.count(), 2);
 }
 
 QC_TEST_GUILESS_MAIN(tst_Store)
