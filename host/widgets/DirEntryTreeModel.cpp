@@ -285,7 +285,10 @@ void DirEntryTreeModel::renameNode(Node* node, const std::string& name, const Do
     const bool isFolder = node->isFolder();
     const std::string id = isFolder ? folderIdOf(node) : entryNode->dirEntry()->id();
     const quint64 serial = node->serial();
-    run(std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name),
+    auto rename = std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name);
+    if (entryNode)
+        rename->setOpenObject(entryNode->object());
+    run(rename,
         [this, serial, name](const std::shared_ptr<Response>&) { applyRename(serial, name); },
         [this, serial, name, oldName, done](bool ok) {
             if (!ok)

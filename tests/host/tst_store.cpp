@@ -198,6 +198,7 @@ private slots:
     void deletingFolderDeletesItsObjects();
     void folderCycleDoesNotHangTheStore();
     void staleSaveIsRefusedAndWritesNothing();
+    void renameCountsAsAChange();
     void twoProgramsSavingOneTemplateOneWins();
     void storeOfTheFirstSchemaIsUpgraded();
     void serverFailuresNameServerAndCause_data();
@@ -751,6 +752,33 @@ void tst_Store::staleSaveIsRefusedAndWritesNothing()
     reread->setName("Door Panel B");
     QVERIFY(!update(store, reread).error);
     QCOMPARE(store.fetch(kTemplate, original->id())->header()->name(), std::string("Door Panel B"));
+}
+
+// A rename elsewhere refuses a save from before it; the renaming editor's
+// own copy saves on.
+void tst_Store::renameCountsAsAChange()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    const std::string topLevel;
+    const std::string entryId = entryIdOf(store.save(jobTemplate, &topLevel));
+    QVERIFY(!entryId.empty());
+    auto elsewhere = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+    auto renaming = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+
+    renaming->setName("Door Trim");
+    auto rename = std::make_shared<RenameDirItem>(DirItemKind::Entry, entryId, "Door Trim");
+    rename->setOpenObject(renaming);
+    QVERIFY(!store.run(rename).error);
+
+    elsewhere->setDescription("changed elsewhere");
+    const auto refused = update(store, elsewhere);
+    QVERIFY(refused.error && refused.error->isConflict());
+    renaming->setDescription("changed by the renaming editor");
+    QVERIFY(!update(store, renaming).error);
+    const auto stored = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+    QCOMPARE(stored->name(), std::string("Door Trim"));
+    QCOMPARE(stored->description(), std::string("changed by the renaming editor"));
 }
 
 // Two other programs read the template, then save it at the same moment.
