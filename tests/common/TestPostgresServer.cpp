@@ -130,6 +130,8 @@ bool TestPostgresServer::runAsServerUser(const QString& program, const QStringLi
 
 bool TestPostgresServer::start()
 {
+    if (m_running)
+        return true;
     const QString options = QStringLiteral("-c listen_addresses='' -c unix_socket_directories='%1' -c fsync=off")
                                 .arg(m_dir.path());
     m_running = runAsServerUser(m_binDir + QStringLiteral("/pg_ctl"),
@@ -140,15 +142,17 @@ bool TestPostgresServer::start()
     return m_running;
 }
 
+// Tried even when the server is thought stopped: a server left running would
+// outlive the tests.
 bool TestPostgresServer::kill()
 {
-    if (!m_running)
-        return true;
-    m_running = !runAsServerUser(m_binDir + QStringLiteral("/pg_ctl"),
-                                 {QStringLiteral("-D"), m_dir.filePath(QStringLiteral("data")), QStringLiteral("-m"),
-                                  QStringLiteral("immediate"), QStringLiteral("-w"), QStringLiteral("stop")},
-                                 30000);
-    return !m_running;
+    const bool stopped = runAsServerUser(m_binDir + QStringLiteral("/pg_ctl"),
+                                         {QStringLiteral("-D"), m_dir.filePath(QStringLiteral("data")),
+                                          QStringLiteral("-m"), QStringLiteral("immediate"), QStringLiteral("-w"),
+                                          QStringLiteral("stop")},
+                                         30000);
+    m_running = false;
+    return stopped;
 }
 
 // Stops the server once this program is gone, however it ended.

@@ -24,7 +24,8 @@ public:
     QString createDatabase();
     // The address of a database with another user name, to be refused.
     QString addressAs(const QString& user, const QString& database) const;
-    // Stops the server at once, as a crash would; start() brings it back.
+    // Stops the server at once, as a crash would; start() brings it back
+    // (and does nothing while it runs).
     bool kill();
     bool start();
 
