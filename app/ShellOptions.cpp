@@ -2,6 +2,7 @@
 
 #include "app/standardsimport/StandardsImport.h"
 #include "host/store/MarloModel.h"
+#include "host/store/StoreDialect.h"
 
 #include <QCommandLineParser>
 #include <QCoreApplication>
@@ -15,8 +16,8 @@ ShellOptions ShellOptions::parse(const QStringList& arguments)
     QCommandLineParser parser;
     parser.setApplicationDescription(QStringLiteral("Host shell of the QC job template editor."));
     parser.addHelpOption();
-    const QCommandLineOption store(QStringLiteral("store"), QStringLiteral("Use the store file <file>."),
-                                   QStringLiteral("file"));
+    const QCommandLineOption store(QStringLiteral("store"), QStringLiteral("Use the store file <store>, or the database of a postgresql://user@host:port/dbname address."),
+                                   QStringLiteral("store"));
     const QCommandLineOption plugins(QStringLiteral("plugins"),
                                      QStringLiteral("Load the client plug-ins of folder <folder>."),
                                      QStringLiteral("folder"));
@@ -74,7 +75,9 @@ std::map<std::string, QString> ShellOptions::otherStoreFiles(const std::vector<s
         const QString name = QString::fromStdString(id);
         if (id == MarloModel::defaultDispatcherId() || id.empty())
             continue;
-        if (plainName.match(name).hasMatch())
+        if (StoreDialect::isServerLocation(name))
+            files[id] = name;
+        else if (plainName.match(name).hasMatch())
             files[id] = folder + QLatin1Char('/') + name + QStringLiteral(".sqlite");
         else if (refused)
             *refused << name;

@@ -27,7 +27,8 @@ struct ShellOptions
     // The files of the stores the user browses besides the default one: one
     // per dispatcher id, beside the default store. Ids that are not plain
     // names (letters, digits, blanks, dashes) are refused, so that no id can
-    // point outside that folder.
+    // point outside that folder. An id that is a postgresql:// address names
+    // a database on that server.
     std::map<std::string, QString> otherStoreFiles(const std::vector<std::string>& dispatcherIds,
                                                    QStringList* refused) const;
 };

@@ -5,7 +5,7 @@ set -euo pipefail
 
 packages=(
   build-essential cmake ninja-build ccache pkg-config
-  qtbase5-dev qtbase5-dev-tools libqt5sql5-sqlite
+  qtbase5-dev qtbase5-dev-tools libqt5sql5-sqlite libqt5sql5-psql postgresql
   libsqlite3-dev liblcms2-dev libbenchmark-dev
   xvfb xauth imagemagick
 )

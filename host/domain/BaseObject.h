@@ -3,6 +3,8 @@
 #include <QCborMap>
 #include <QUuid>
 
+#include <atomic>
+#include <cstdint>
 #include <functional>
 #include <memory>
 #include <string>
@@ -26,6 +28,13 @@ public:
     std::string id() const { return m_id; }
     void setId(const std::string& id) { m_id = id; }
     QUuid uuid() const;
+
+    // The store's revision of the object when it was read or last saved here;
+    // 0 for an object the store has not seen. Not part of the object's
+    // content: a save states it, and the store refuses the save when another
+    // one was stored since. Safe to read and set from a store's worker.
+    std::int64_t storedRevision() const { return m_storedRevision.load(); }
+    void setStoredRevision(std::int64_t revision) { m_storedRevision.store(revision); }
 
     // The type id of the object's own class, equal to that class's static typeId().
     virtual std::string objectTypeId() const = 0;
@@ -52,6 +61,7 @@ public:
 private:
     std::string m_id;
     std::shared_ptr<Header> m_header;
+    std::atomic<std::int64_t> m_storedRevision{0};
 };
 
 } // namespace vemi

@@ -20,6 +20,11 @@ public:
     std::string folderId() const { return m_folderId; }
     void setFolderId(const std::string& id) { m_folderId = id; }
 
+    // The stored revision of the named object when the entry was listed; 0
+    // when unknown. Not part of the entry's content.
+    std::int64_t entryObjectRevision() const { return m_entryObjectRevision; }
+    void setEntryObjectRevision(std::int64_t revision) { m_entryObjectRevision = revision; }
+
     void writeFields(QCborMap& map) const override;
     void readFields(const QCborMap& map) override;
 
@@ -27,6 +32,7 @@ private:
     std::string m_entryObjectId;
     std::string m_entryObjectType;
     std::string m_folderId;
+    std::int64_t m_entryObjectRevision = 0;
 };
 
 } // namespace vemi

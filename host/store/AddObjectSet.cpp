@@ -62,7 +62,7 @@ std::vector<std::string> AddObjectSet::resolveFolders(StoreDatabase& database) c
     for (const PlannedFolder& folder : m_folders) {
         const std::string parentId = folder.parent == kTopLevel ? std::string() : ids.at(size_t(folder.parent));
         const QVariant existing = database.scalar(
-            QStringLiteral("SELECT id FROM folders WHERE object_type = ? AND parent_id IS ? AND name = ?"),
+            QStringLiteral("SELECT id FROM folders WHERE object_type = ? AND parent_id IS NOT DISTINCT FROM ? AND name = ?"),
             {QString::fromStdString(folder.objectType), DirectoryQueries::folderValue(parentId),
              QString::fromStdString(folder.name)});
         if (existing.isValid()) {

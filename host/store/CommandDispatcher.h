@@ -23,6 +23,11 @@ public:
     // The result is an id for the dispatched command.
     virtual std::string dispatch(std::shared_ptr<QtCommand> command) = 0;
 
+signals:
+    // Another program changed the store (where the store can tell: a server
+    // announces every write). Emitted on the dispatcher's thread.
+    void sgStoreChanged();
+
 private:
     std::string m_id;
 };

@@ -10,10 +10,10 @@ std::shared_ptr<Response> DeleteDirItems::execute(StoreDatabase& database)
     database.writeTransaction([&] {
         for (const std::string& folderId : m_folderIds) {
             const QString id = QString::fromStdString(folderId);
-            database.run(QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT ? UNION"
+            database.run(QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT CAST(? AS TEXT) UNION"
                                         " SELECT f.id FROM folders f JOIN sub ON f.parent_id = sub.id)"
                                         " DELETE FROM objects WHERE id IN"
-                                        " (SELECT object_id FROM dir_entries WHERE folder_id IN sub)"),
+                                        " (SELECT object_id FROM dir_entries WHERE folder_id IN (SELECT id FROM sub))"),
                          {id});
             database.run(QStringLiteral("DELETE FROM folders WHERE id = ?"), {id});
         }

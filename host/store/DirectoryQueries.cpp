@@ -28,7 +28,7 @@ void DirectoryQueries::requireFreeFolderName(const std::string& objectType, cons
     if (name.empty())
         throw StoreError("a folder needs a name");
     const QVariant clash = m_database.scalar(
-        QStringLiteral("SELECT 1 FROM folders WHERE object_type = ? AND parent_id IS ? AND name = ? AND id <> ?"),
+        QStringLiteral("SELECT 1 FROM folders WHERE object_type = ? AND parent_id IS NOT DISTINCT FROM ? AND name = ? AND id <> ?"),
         {QString::fromStdString(objectType), folderValue(parentId), QString::fromStdString(name),
          QString::fromStdString(exceptId)});
     if (clash.isValid())
@@ -47,7 +47,7 @@ void DirectoryQueries::insertFolder(const DirFolder& folder)
 bool DirectoryQueries::isInSubtree(const std::string& folderId, const std::string& rootId)
 {
     return m_database.scalar(
-        QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT ? UNION"
+        QStringLiteral("WITH RECURSIVE sub(id) AS (SELECT CAST(? AS TEXT) UNION"
                        " SELECT f.id FROM folders f JOIN sub ON f.parent_id = sub.id)"
                        " SELECT 1 FROM sub WHERE id = ?"),
         {QString::fromStdString(rootId), QString::fromStdString(folderId)}).isValid();

@@ -8,11 +8,15 @@ namespace vemi {
 class ErrorInfo
 {
 public:
-    explicit ErrorInfo(QString message) : m_message(std::move(message)) {}
+    explicit ErrorInfo(QString message, bool conflict = false)
+        : m_message(std::move(message)), m_conflict(conflict) {}
     QString message() const { return m_message; }
+    // A save refused because someone else stored the object since it was read.
+    bool isConflict() const { return m_conflict; }
 
 private:
     QString m_message;
+    bool m_conflict;
 };
 
 } // namespace vemi

@@ -62,6 +62,8 @@ std::shared_ptr<Response> FillEmptyStore::execute(StoreDatabase& database)
             m_objects[i]->write(database, encoded[i]);
         written = true;
     });
+    for (const auto& update : m_objects)
+        update->commitRevision();
     return std::make_shared<FillEmptyStoreResponse>(written);
 }
 

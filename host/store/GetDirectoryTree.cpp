@@ -21,7 +21,7 @@ std::shared_ptr<Response> GetDirectoryTree::execute(StoreDatabase& database)
 
     std::vector<std::shared_ptr<DirEntry>> entries;
     QSqlQuery entryRows = database.run(
-        QStringLiteral("SELECT e.id, e.object_id, e.folder_id, o.name FROM dir_entries e"
+        QStringLiteral("SELECT e.id, e.object_id, e.folder_id, o.name, o.revision FROM dir_entries e"
                        " JOIN objects o ON o.id = e.object_id WHERE o.type = ? ORDER BY o.name"),
         {type});
     while (entryRows.next()) {
@@ -31,6 +31,7 @@ std::shared_ptr<Response> GetDirectoryTree::execute(StoreDatabase& database)
         entry->setEntryObjectType(m_objectType);
         entry->setFolderId(entryRows.value(2).toString().toStdString());
         entry->header()->setName(entryRows.value(3).toString().toStdString());
+        entry->setEntryObjectRevision(entryRows.value(4).toLongLong());
         entries.push_back(entry);
     }
     return std::make_shared<DirectoryTreeResponse>(std::move(folders), std::move(entries));

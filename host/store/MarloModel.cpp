@@ -1,5 +1,6 @@
 #include "host/store/MarloModel.h"
 
+#include "host/store/StoreDialect.h"
 #include "host/store/StoreDispatcher.h"
 
 #include <QDir>
@@ -29,9 +30,16 @@ MarloModel::~MarloModel() = default;
 
 QString MarloModel::open()
 {
+    if (StoreDialect::isServerLocation(m_defaultStorePath))
+        return openDefault();
     const QString folder = QFileInfo(m_defaultStorePath).absolutePath();
     if (!QDir().mkpath(folder))
         return QStringLiteral("Cannot create the folder of the store: %1").arg(folder);
+    return openDefault();
+}
+
+QString MarloModel::openDefault()
+{
     auto dispatcher = std::dynamic_pointer_cast<StoreDispatcher>(commandDispatcher(defaultDispatcherId()));
     return dispatcher ? dispatcher->openAndWait() : QString();
 }
@@ -60,6 +68,9 @@ bool MarloModel::isWritable(const std::string& dispatcherId) const
     const auto store = std::dynamic_pointer_cast<StoreDispatcher>(commandDispatcher(dispatcherId));
     if (!store)
         return commandDispatcher(dispatcherId) != nullptr;
+    // What the login may change shows only when a write is tried.
+    if (StoreDialect::isServerLocation(store->path()))
+        return true;
     const QFileInfo file(store->path());
     const QFileInfo folder(file.absolutePath());
     return folder.isWritable() && (!file.exists() || file.isWritable());

@@ -30,7 +30,7 @@ public:
 
     // An empty handle for an id that names no store.
     std::shared_ptr<CommandDispatcher> commandDispatcher(const std::string& dispatcherId) const;
-    // Adds the store file of another dispatcher id.
+    // Adds the store of another dispatcher id: a file, or a postgresql:// address.
     void addStore(const std::string& dispatcherId, const QString& path);
     // Puts another dispatcher in place of the one of the id (tests record commands this way).
     void setCommandDispatcher(const std::string& dispatcherId, std::shared_ptr<CommandDispatcher> dispatcher);
@@ -42,6 +42,7 @@ public:
     bool isWritable(const std::string& dispatcherId = std::string()) const;
 
 private:
+    QString openDefault();
     static std::string normalised(const std::string& dispatcherId);
 
     QString m_defaultStorePath;

@@ -20,6 +20,8 @@ std::shared_ptr<Response> RenameDirItem::execute(StoreDatabase& database)
         else
             renameEntry(database);
     });
+    if (m_openObject && m_readRevision > 0 && m_openObject->storedRevision() == m_readRevision)
+        m_openObject->setStoredRevision(m_readRevision + 1);
     return std::make_shared<Response>();
 }
 
@@ -37,15 +39,16 @@ void RenameDirItem::renameFolder(StoreDatabase& database)
 
 void RenameDirItem::renameEntry(StoreDatabase& database)
 {
-    QSqlQuery stored = database.run(QStringLiteral("SELECT o.id, o.data FROM dir_entries e"
+    QSqlQuery stored = database.run(QStringLiteral("SELECT o.id, o.data, o.revision FROM dir_entries e"
                                                    " JOIN objects o ON o.id = e.object_id WHERE e.id = ?"),
                                     {QString::fromStdString(m_id)});
     if (!stored.next())
         throw StoreError("the entry no longer exists");
     const QString objectId = stored.value(0).toString();
+    m_readRevision = stored.value(2).toLongLong();
     auto object = ObjectCodec::deserialize(stored.value(1).toByteArray());
     object->header()->setName(m_name);
-    database.run(QStringLiteral("UPDATE objects SET name = ?, data = ? WHERE id = ?"),
+    database.run(QStringLiteral("UPDATE objects SET name = ?, data = ?, revision = revision + 1 WHERE id = ?"),
                  {QString::fromStdString(m_name), ObjectCodec::serialize(*object), objectId});
 }
 

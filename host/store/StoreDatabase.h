@@ -8,37 +8,40 @@
 #include <QVariantList>
 
 #include <functional>
+#include <memory>
 
 class QSqlError;
 
 namespace vemi {
 
-// One SQLite connection to a store file. Created, used and destroyed on one
-// thread (a dispatcher's worker). Every failure is thrown as a StoreError whose
-// message names the operation, the file and the cause.
+class StoreDialect;
+
+// One connection to a store: an SQLite file or a database on a PostgreSQL
+// server, told apart by its location (see StoreDialect). Created, used and
+// destroyed on one thread (a dispatcher's worker). Every failure is thrown as
+// a StoreError whose message names the operation, the store and the cause.
 class StoreDatabase
 {
 public:
-    // Marks the file as ours ("QCJT") so that a foreign SQLite file is refused.
+    // Marks the store as ours ("QCJT") so that a foreign database is refused.
     static constexpr int kApplicationId = 0x51434A54;
 
-    StoreDatabase(QString path, StoreOptions options);
+    StoreDatabase(QString location, StoreOptions options);
     StoreDatabase(const StoreDatabase&) = delete;
     StoreDatabase& operator=(const StoreDatabase&) = delete;
     ~StoreDatabase();
 
+    // The file path or server address that messages name the store by.
     QString path() const { return m_path; }
     bool isOpen() const { return m_open; }
     static int schemaVersion();
 
-    // Opens the file, refuses one that is not a store, creates or migrates the
-    // schema. Nothing is written to a file that fails the checks. A read-only
-    // open never writes the file and works in a folder nobody may write and
-    // on a full disk, where SQLite cannot make its side files (-wal, -shm).
+    // Opens the store, refuses one that is not a store, creates or migrates
+    // the schema. Nothing is written to a store that fails the checks.
     void open();
 
     // Runs one statement with positional bindings, positioned before its first
-    // row; throws StoreError with the cause and the file (the dispatcher adds
+    // row; throws StoreError with the cause and the store (the dispatcher adds
     // what the command was doing).
     QSqlQuery run(const QString& sql, const QVariantList& bindings = {});
     // For one statement run many times, as in a batch write: prepare once,
@@ -47,31 +50,30 @@ public:
     void execute(QSqlQuery& query, const QVariantList& bindings);
     // The first column of the first row, or an invalid QVariant when there is none.
     QVariant scalar(const QString& sql, const QVariantList& bindings = {});
-    // Runs body inside BEGIN IMMEDIATE … COMMIT; rolls back and rethrows on failure.
+    // Runs body in a transaction that no other writer runs beside; rolls back
+    // and rethrows on failure.
     void writeTransaction(const std::function<void()>& body);
 
     QString describe(const QSqlError& error) const;
-    // What a failed SQLite call means, in words a person can act on; empty
-    // when SQLite's own text says it best. diskFull: the store's disk has no
-    // room left, which turns SQLite's "disk I/O error" into plain words.
-    static QString explain(int sqliteCode, bool diskFull);
+    // Calls onChange (on this thread) whenever another connection announces
+    // a write; false where the store announces none.
+    bool watchChanges(QObject* context, const std::function<void()>& onChange);
+    // A statement failed because the connection broke (a server that went
+    // away): the connection is of no further use.
+    bool isConnectionLost() const { return m_connectionLost; }
 
 private:
-    enum class Access { ReadWrite, ReadOnly, Immutable };
-    // Opens the connection and runs the checks; throws StoreError.
-    void connect(Access access);
-    void openReadOnly();
-    bool diskFull() const;
-    StoreError failure(const QSqlError& error) const;
+    // The error to throw for a failed statement; notes a broken connection.
+    StoreError failure(const QSqlError& error);
     void checkOwnership();
     void migrate();
-    void applyPragmas();
-    int readPragma(const char* name);
 
     QString m_path;
     StoreOptions m_options;
     QString m_connectionName;
+    std::unique_ptr<StoreDialect> m_dialect;
     bool m_open = false;
+    bool m_connectionLost = false;
 };
 
 } // namespace vemi

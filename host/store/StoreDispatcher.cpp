@@ -13,6 +13,7 @@ StoreDispatcher::StoreDispatcher(std::string id, QString path, StoreOptions opti
 {
     m_thread.setObjectName(QStringLiteral("store:") + QString::fromStdString(this->id()));
     m_worker->moveToThread(&m_thread);
+    connect(m_worker, &StoreWorker::sgStoreChanged, this, &CommandDispatcher::sgStoreChanged, Qt::QueuedConnection);
     m_thread.start();
 }
 

@@ -28,6 +28,7 @@ QString StoreWorker::ensureOpen()
         return QString::fromStdString(error.what());
     }
     m_database = std::move(database);
+    m_database->watchChanges(this, [this] { emit sgStoreChanged(); });
     return {};
 }
 
@@ -41,9 +42,12 @@ void StoreWorker::run(std::shared_ptr<QtCommand> command)
     std::shared_ptr<ErrorInfo> error;
     std::shared_ptr<Response> response;
     const QString openError = ensureOpen();
-    if (openError.isEmpty())
+    if (openError.isEmpty()) {
         response = execute(*command->command(), error);
-    else
+        // The next command connects anew, e.g. to a server that is back.
+        if (m_database->isConnectionLost())
+            m_database.reset();
+    } else
         error = std::make_shared<ErrorInfo>(openError);
     // The handle moves into the delivery: the worker keeps none of its own.
     if (error)
@@ -55,14 +59,14 @@ void StoreWorker::run(std::shared_ptr<QtCommand> command)
 std::shared_ptr<Response> StoreWorker::execute(Command& command, std::shared_ptr<ErrorInfo>& error)
 {
     const QString what = QString::fromStdString(command.description());
-    const auto fail = [&](const QString& cause) {
-        error = std::make_shared<ErrorInfo>(QStringLiteral("Cannot %1: %2").arg(what, cause));
+    const auto fail = [&](const QString& cause, bool conflict = false) {
+        error = std::make_shared<ErrorInfo>(QStringLiteral("Cannot %1: %2").arg(what, cause), conflict);
         return nullptr;
     };
     try {
         return command.execute(*m_database);
     } catch (const StoreError& failure) {
-        return fail(QString::fromUtf8(failure.what()));
+        return fail(QString::fromUtf8(failure.what()), failure.isConflict());
     } catch (const DecodeError& failure) {
         return fail(QStringLiteral("the stored object is damaged (%1): %2").arg(QString::fromUtf8(failure.what()), m_path));
     } catch (const std::exception& failure) {

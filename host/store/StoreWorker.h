@@ -31,6 +31,10 @@ public:
     QString ensureOpen();
     void close();
 
+signals:
+    // Another program wrote to the store.
+    void sgStoreChanged();
+
 private:
     // Runs the command; on failure sets error and returns null.
     std::shared_ptr<Response> execute(Command& command, std::shared_ptr<ErrorInfo>& error);

@@ -43,10 +43,11 @@ std::vector<std::shared_ptr<BaseObject>> StoredObjectReader::readAll(const std::
 {
     // All rows first: reading a library's members runs queries of its own.
     std::vector<Row> rows;
-    QSqlQuery query = m_database.run(QStringLiteral("SELECT id, data FROM objects WHERE type = ? ORDER BY name, id"),
+    QSqlQuery query = m_database.run(QStringLiteral("SELECT id, data, revision FROM objects WHERE type = ? ORDER BY name, id"),
                                      {QString::fromStdString(type)});
     while (query.next())
-        rows.push_back({query.value(0).toString().toStdString(), type, query.value(1).toByteArray()});
+        rows.push_back({query.value(0).toString().toStdString(), type, query.value(1).toByteArray(),
+                        query.value(2).toLongLong()});
     query.finish();
 
     std::vector<std::shared_ptr<BaseObject>> objects;
@@ -69,11 +70,11 @@ void StoredObjectReader::noteDamaged(const std::string& id, const DecodeError& e
 
 std::optional<StoredObjectReader::Row> StoredObjectReader::findRow(const std::string& id)
 {
-    QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data FROM objects WHERE id = ?"),
+    QSqlQuery query = m_database.run(QStringLiteral("SELECT type, data, revision FROM objects WHERE id = ?"),
                                      {QString::fromStdString(id)});
     if (!query.next())
         return std::nullopt;
-    return Row{id, query.value(0).toString().toStdString(), query.value(1).toByteArray()};
+    return Row{id, query.value(0).toString().toStdString(), query.value(1).toByteArray(), query.value(2).toLongLong()};
 }
 
 StoredObjectReader::Row StoredObjectReader::fetch(const std::string& id, const std::string& expectedType)
@@ -100,6 +101,7 @@ std::shared_ptr<BaseObject> StoredObjectReader::decode(const Row& row, int depth
     if (object->objectTypeId() != row.type)
         throw DecodeError("object " + row.id + " is stored as a " + row.type + " but holds a "
                           + object->objectTypeId());
+    object->setStoredRevision(row.revision);
     if (depth >= 2 && !object->referencedIds().empty())
         resolveMembers(*object, depth);
     return object;

@@ -46,6 +46,7 @@ private:
         std::string id;
         std::string type;
         QByteArray data;
+        qint64 revision = 0;
     };
 
     // Nothing when there is no object of the id.

@@ -7,6 +7,7 @@
 #include "host/domain/ObjectCodec.h"
 #include "host/store/StoreDatabase.h"
 #include "host/store/StoreError.h"
+#include "host/store/StoredObjectReader.h"
 #include "host/store/UpdateObjectResponse.h"
 
 #include <QUuid>
@@ -28,6 +29,7 @@ std::shared_ptr<Response> UpdateObject::execute(StoreDatabase& database)
     const QByteArray data = encode();
     std::shared_ptr<DirEntry> entry;
     database.writeTransaction([&] { entry = write(database, data); });
+    commitRevision();
     return std::make_shared<UpdateObjectResponse>(m_id, entry);
 }
 
@@ -40,11 +42,37 @@ QByteArray UpdateObject::encode() const
 
 std::shared_ptr<DirEntry> UpdateObject::write(StoreDatabase& database, const QByteArray& data)
 {
-    database.run(QStringLiteral("INSERT INTO objects(id, type, name, data) VALUES(?, ?, ?, ?)"
+    const qint64 revision = nextRevision(database);
+    database.run(QStringLiteral("INSERT INTO objects(id, type, name, data, revision) VALUES(?, ?, ?, ?, ?)"
                                 " ON CONFLICT(id) DO UPDATE SET type = excluded.type,"
-                                " name = excluded.name, data = excluded.data"),
-                 {QString::fromStdString(m_id), QString::fromStdString(m_type), QString::fromStdString(m_name), data});
+                                " name = excluded.name, data = excluded.data, revision = excluded.revision"),
+                 {QString::fromStdString(m_id), QString::fromStdString(m_type), QString::fromStdString(m_name), data,
+                  revision});
+    m_writtenRevision = revision;
     return m_folderId ? fileInFolder(database) : nullptr;
+}
+
+// Read inside the write transaction, so that no other save can come between
+// the check and the write. The revision the save states is read from the
+// object now, not when the command was sent: an earlier save of the same
+// object, queued before this one, has given it the revision it wrote.
+qint64 UpdateObject::nextRevision(StoreDatabase& database)
+{
+    const QVariant stored =
+        database.scalar(QStringLiteral("SELECT revision FROM objects WHERE id = ?"), {QString::fromStdString(m_id)});
+    if (!stored.isValid())
+        return 1; // a new object, or one deleted elsewhere: stored anew
+    const qint64 read = m_object->storedRevision();
+    if (stored.toLongLong() != read)
+        throw StoreError::conflict(StoredObjectReader(database).describe(m_id).toStdString()
+                                   + " was changed elsewhere since it was opened");
+    return stored.toLongLong() + 1;
+}
+
+void UpdateObject::commitRevision()
+{
+    if (m_writtenRevision > 0)
+        m_object->setStoredRevision(m_writtenRevision);
 }
 
 std::shared_ptr<DirEntry> UpdateObject::fileInFolder(StoreDatabase& database)

@@ -13,6 +13,9 @@ class BaseObject;
 class DirEntry;
 
 // Stores an object: creates it or replaces the stored one with the same id.
+// Replacing states the revision the object was read at: when another save
+// came since, the command is refused (StoreError::conflict) and writes
+// nothing. After a save the object carries the revision it wrote.
 // The object's snapshot is taken when the command is dispatched (cheap: image
 // bytes are shared, not copied) and encoded on the worker; later edits of
 // the object are not part of this write.
@@ -33,9 +36,13 @@ public:
     // inside the caller's transaction. write() returns the folder entry, if any.
     QByteArray encode() const;
     std::shared_ptr<DirEntry> write(StoreDatabase& database, const QByteArray& data);
+    // Gives the object the revision write() stored; call once the transaction committed.
+    void commitRevision();
 
 private:
     std::shared_ptr<DirEntry> fileInFolder(StoreDatabase& database);
+    // Throws StoreError::conflict when the stored revision is not the one read.
+    qint64 nextRevision(StoreDatabase& database);
 
     std::shared_ptr<BaseObject> m_object;
     std::optional<std::string> m_folderId;
@@ -43,6 +50,7 @@ private:
     std::string m_id;
     std::string m_type;
     std::string m_name;
+    qint64 m_writtenRevision = 0;
 };
 
 } // namespace vemi

@@ -3,6 +3,9 @@
 #include "host/widgets/NameDialog.h"
 
 #include <QCoreApplication>
+#include <algorithm>
+#include <vector>
+
 #include <QInputDialog>
 #include <QMessageBox>
 #include <QPushButton>
@@ -25,6 +28,25 @@ bool DialogAsker::confirm(QWidget* parent, const QString& title, const QString& 
     box.setDefaultButton(defaultAnswer == DefaultAnswer::Yes ? QMessageBox::Yes : QMessageBox::No);
     box.setEscapeButton(QMessageBox::No);
     return box.exec() == QMessageBox::Yes;
+}
+
+std::optional<int> DialogAsker::choose(QWidget* parent, const QString& title, const QString& question,
+                                       const QStringList& choices, int defaultChoice)
+{
+    QMessageBox box(QMessageBox::Question, title, question, QMessageBox::NoButton, parent);
+    std::vector<QPushButton*> buttons;
+    for (const QString& choice : choices)
+        buttons.push_back(box.addButton(choice, QMessageBox::AcceptRole));
+    QPushButton* cancel =
+        box.addButton(QCoreApplication::translate("vemi::DialogAsker", "&Cancel"), QMessageBox::RejectRole);
+    box.setEscapeButton(cancel);
+    if (defaultChoice >= 0 && size_t(defaultChoice) < buttons.size())
+        box.setDefaultButton(buttons[size_t(defaultChoice)]);
+    box.exec();
+    const auto chosen = std::find(buttons.begin(), buttons.end(), box.clickedButton());
+    if (chosen == buttons.end())
+        return std::nullopt;
+    return int(chosen - buttons.begin());
 }
 
 } // namespace vemi

@@ -13,6 +13,8 @@ public:
                                    const QString& suggestion, const TextCheck& check) override;
     bool confirm(QWidget* parent, const QString& title, const QString& question,
                  DefaultAnswer defaultAnswer) override;
+    std::optional<int> choose(QWidget* parent, const QString& title, const QString& question,
+                              const QStringList& choices, int defaultChoice) override;
 };
 
 } // namespace vemi

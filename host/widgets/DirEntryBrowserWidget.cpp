@@ -6,6 +6,7 @@
 #include "host/widgets/FolderCommands.h"
 #include "host/widgets/ObjectTypeNames.h"
 #include "host/widgets/TreePickerDialog.h"
+#include "host/widgets/UserAsker.h"
 #include "host/domain/NamedObject.h"
 #include "host/store/MarloModel.h"
 
@@ -19,6 +20,7 @@
 #include <QPointer>
 #include <QPushButton>
 #include <QStyle>
+#include <QTimer>
 #include <QTreeView>
 #include <QVBoxLayout>
 
@@ -142,6 +144,10 @@ void DirEntryBrowserWidget::initialize(DirEntryTreeModel* model, DirEntryBrowser
     connect(m_tree->selectionModel(), &QItemSelectionModel::selectionChanged, this,
             &DirEntryBrowserWidget::onTreeSelectionChanged);
     connect(m_model, &DirEntryTreeModel::sgErrorOccurred, this, &DirEntryBrowserWidget::showError);
+    connect(m_model, &DirEntryTreeModel::sgStoreChanged, this, &DirEntryBrowserWidget::refreshSoon);
+    // Queued: the question is not asked inside the save's answer.
+    connect(m_model, &DirEntryTreeModel::sgSaveConflict, this, &DirEntryBrowserWidget::resolveSaveConflict,
+            Qt::QueuedConnection);
     // Every reload rebuilds the nodes; the view keeps its open folders and selection.
     connect(m_model, &QAbstractItemModel::modelAboutToBeReset, this, &DirEntryBrowserWidget::keepViewState);
     connect(m_model, &QAbstractItemModel::modelReset, this, &DirEntryBrowserWidget::restoreViewState);
@@ -366,6 +372,39 @@ void DirEntryBrowserWidget::saveCurrentObject()
     });
 }
 
+void DirEntryBrowserWidget::resolveSaveConflict(quint64 serial, const QString& message)
+{
+    auto* node = dynamic_cast<DirEntryNode*>(m_model->findBySerial(serial));
+    if (!node || !node->object()) {
+        showError(message);
+        return;
+    }
+    const QString question = message + QStringLiteral("\n\n")
+        + tr("Save your edit as a copy beside it, or reload the stored version and drop your edit? "
+             "Cancel keeps your edit open, unsaved.");
+    const std::optional<int> choice = m_folderCommands->asker()->choose(
+        this, tr("Changed elsewhere"), question, {tr("Save as &Copy"), tr("&Reload")}, 0);
+    if (!choice)
+        return;
+    if (*choice == 1) {
+        reloadStored(serial);
+        return;
+    }
+    // The stored version is read again only once the copy is safe.
+    m_model->saveCopy(node, [this, self = QPointer<DirEntryBrowserWidget>(this), serial](bool saved) {
+        if (self && saved)
+            reloadStored(serial);
+    });
+}
+
+void DirEntryBrowserWidget::reloadStored(quint64 serial)
+{
+    if (auto* node = dynamic_cast<DirEntryNode*>(m_model->findBySerial(serial))) {
+        m_model->discardObject(node);
+        onTreeSelectionChanged();
+    }
+}
+
 bool DirEntryBrowserWidget::saveAndWait(const std::vector<Node*>& nodes)
 {
     struct Progress
@@ -464,8 +503,33 @@ QString DirEntryBrowserWidget::nameList(const QStringList& names)
 
 void DirEntryBrowserWidget::refresh()
 {
-    if (m_model)
-        m_model->load();
+    if (!m_model)
+        return;
+    // Objects saved elsewhere were dropped from the tree: the selected ones
+    // are read again and handed to the client.
+    m_model->load([this, self = QPointer<DirEntryBrowserWidget>(this)](bool ok) {
+        if (!self || !ok)
+            return;
+        const auto nodes = selectedNodes();
+        const bool dropped = std::any_of(nodes.begin(), nodes.end(), [](Node* node) {
+            auto* entry = dynamic_cast<DirEntryNode*>(node);
+            return entry && entry->isSaved() && !entry->object();
+        });
+        if (dropped)
+            onTreeSelectionChanged();
+    });
+}
+
+// A burst of changes elsewhere (a folder of objects saved at once) makes one refresh.
+void DirEntryBrowserWidget::refreshSoon()
+{
+    if (m_refreshPending)
+        return;
+    m_refreshPending = true;
+    QTimer::singleShot(kRefreshDelayMs, this, [this] {
+        m_refreshPending = false;
+        refresh();
+    });
 }
 
 void DirEntryBrowserWidget::keepViewState()

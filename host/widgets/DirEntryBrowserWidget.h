@@ -64,7 +64,8 @@ public:
     void createCustomMenus(QMenu* menu, const QString& singular, const QString& plural, bool withFolderActions);
 
     // Reads the tree again from the store; unsaved work, open folders and the
-    // selection are kept.
+    // selection are kept. Unchanged objects that were saved elsewhere
+    // meanwhile are read again.
     void refresh();
     // Asks Save / Discard / Cancel when objects are unsaved; true when the
     // browser may close (everything saved or the user chose to discard).
@@ -109,6 +110,11 @@ private:
     void selectNode(BaseObjectTreeModel::Node* node);
     void updateActions();
     void showError(const QString& message);
+    // Another save came between opening the object and saving it: the user
+    // saves the edit as a copy, reloads the stored version, or keeps editing.
+    void resolveSaveConflict(quint64 serial, const QString& message);
+    void reloadStored(quint64 serial);
+    void refreshSoon();
     void showContextMenu(const QPoint& position);
 
     void createNewObject();
@@ -140,6 +146,8 @@ private:
     QString m_plural;
     bool m_writable = true;
     quint64 m_selectionGeneration = 0;
+    static constexpr int kRefreshDelayMs = 200;
+    bool m_refreshPending = false;
     quint64 m_newObjectFolder = 0; // serial of the folder "new" files into; 0 = top level
 };
 

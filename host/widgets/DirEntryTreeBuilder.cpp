@@ -103,8 +103,20 @@ void DirEntryTreeBuilder::placeEntries(const DirectoryTreeResponse& tree, Node* 
             node = std::make_unique<DirEntryNode>(entry, entry->folderId());
         node->setDirEntry(entry);
         node->setFolderId(entry->folderId());
+        dropIfStale(*node);
         BaseObjectTreeModel::adopt(folderOr(entry->folderId(), root), std::move(node));
     }
+}
+
+// An unchanged object that was saved elsewhere since it was read is read
+// again when next wanted; a changed one is kept (its save will be refused
+// and the user asked).
+void DirEntryTreeBuilder::dropIfStale(DirEntryNode& node)
+{
+    const auto& object = node.object();
+    const std::int64_t listed = node.dirEntry()->entryObjectRevision();
+    if (object && !node.isModified() && listed != 0 && object->storedRevision() != listed)
+        node.setObject(nullptr);
 }
 
 void DirEntryTreeBuilder::keepUnsavedWork(Node* root)

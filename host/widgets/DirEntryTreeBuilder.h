@@ -30,6 +30,7 @@ private:
     void placeFolders(const DirectoryTreeResponse& tree, Node* root);
     void placeEntries(const DirectoryTreeResponse& tree, Node* root);
     void keepUnsavedWork(Node* root);
+    static void dropIfStale(DirEntryNode& node);
     bool isInCycle(const std::string& folderId) const;
     Node* folderOr(const std::string& folderId, Node* root) const;
 

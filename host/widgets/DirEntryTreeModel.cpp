@@ -1,5 +1,6 @@
 #include "host/widgets/DirEntryTreeModel.h"
 
+#include "host/store/CommandDispatcher.h"
 #include "host/store/CommandSender.h"
 #include "host/store/CreateFolder.h"
 #include "host/store/DeleteDirItems.h"
@@ -18,6 +19,10 @@
 #include "host/store/RenameDirItem.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
+#include "host/domain/ObjectCodec.h"
+#include "host/widgets/FirstFreeName.h"
+
+#include <QUuid>
 
 #include <QIcon>
 
@@ -71,6 +76,9 @@ std::string DirEntryTreeModel::folderIdOf(const Node* folder)
 
 void DirEntryTreeModel::load(const Done& done)
 {
+    if (const auto dispatcher = m_store.commandDispatcher(m_dispatcherId))
+        connect(dispatcher.get(), &CommandDispatcher::sgStoreChanged, this, &DirEntryTreeModel::sgStoreChanged,
+                Qt::UniqueConnection);
     run(std::make_shared<GetDirectoryTree>(m_objectType),
         [this](const std::shared_ptr<Response>& response) {
             if (const auto tree = std::dynamic_pointer_cast<DirectoryTreeResponse>(response))
@@ -189,24 +197,62 @@ void DirEntryTreeModel::saveObject(DirEntryNode* node, const Done& done)
     command->setFolderId(node->folderId());
     const quint64 serial = node->serial();
     const quint64 revision = node->revision();
-    run(command, [this, serial, revision](const std::shared_ptr<Response>& response) {
-        auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
-        if (!target)
+    const auto onError = [this, serial, done, fail = failure(done)](const std::shared_ptr<ErrorInfo>& error) {
+        if (!error->isConflict()) {
+            fail(error);
             return;
-        const auto answer = std::dynamic_pointer_cast<UpdateObjectResponse>(response);
-        if (answer && answer->entry() && !target->isSaved())
-            target->setDirEntry(answer->entry());
-        if (target->isSaved())
-            target->dirEntry()->header()->setName(target->object()->name());
-        // An edit made while the save ran is not in the store yet.
-        if (target->revision() == revision)
-            target->setModified(false);
-        nodeChanged(target);
-        if (target->isSaved()) {
-            auto entry = target->dirEntry();
-            emit sgItemChanged(entry);
         }
-    }, done);
+        emit sgSaveConflict(serial, error->message());
+        if (done)
+            done(false);
+    };
+    CommandSender::send(m_store, m_dispatcherId, command, this,
+                        [this, serial, revision, done](const std::shared_ptr<Response>& response) {
+                            applySave(serial, revision, response);
+                            if (done)
+                                done(true);
+                        },
+                        onError);
+}
+
+void DirEntryTreeModel::applySave(quint64 serial, quint64 revision, const std::shared_ptr<Response>& response)
+{
+    auto* target = dynamic_cast<DirEntryNode*>(findBySerial(serial));
+    if (!target)
+        return;
+    const auto answer = std::dynamic_pointer_cast<UpdateObjectResponse>(response);
+    if (answer && answer->entry() && !target->isSaved())
+        target->setDirEntry(answer->entry());
+    if (target->isSaved())
+        target->dirEntry()->header()->setName(target->object()->name());
+    // An edit made while the save ran is not in the store yet.
+    if (target->revision() == revision)
+        target->setModified(false);
+    nodeChanged(target);
+    if (target->isSaved()) {
+        auto entry = target->dirEntry();
+        emit sgItemChanged(entry);
+    }
+}
+
+void DirEntryTreeModel::discardObject(DirEntryNode* node)
+{
+    node->setObject(nullptr);
+    node->setModified(false);
+    nodeChanged(node);
+}
+
+void DirEntryTreeModel::saveCopy(DirEntryNode* node, const Done& done)
+{
+    if (!node->object())
+        return;
+    auto copy = std::dynamic_pointer_cast<NamedObject>(ObjectCodec::clone<BaseObject>(*node->object()));
+    if (!copy)
+        return;
+    copy->setId(QUuid::createUuid().toString(QUuid::WithoutBraces).toStdString());
+    Node* folder = node->parent() && node->parent() != root() ? node->parent() : nullptr;
+    copy->setName(firstFreeName(copy->name() + tr(" (copy)").toStdString(), namesIn(folder)));
+    saveObject(addUnsavedObject(folder, copy), done);
 }
 
 void DirEntryTreeModel::createFolder(Node* parentFolder, const std::string& name, const Done& done)
@@ -239,7 +285,10 @@ void DirEntryTreeModel::renameNode(Node* node, const std::string& name, const Do
     const bool isFolder = node->isFolder();
     const std::string id = isFolder ? folderIdOf(node) : entryNode->dirEntry()->id();
     const quint64 serial = node->serial();
-    run(std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name),
+    auto rename = std::make_shared<RenameDirItem>(isFolder ? DirItemKind::Folder : DirItemKind::Entry, id, name);
+    if (entryNode)
+        rename->setOpenObject(entryNode->object());
+    run(rename,
         [this, serial, name](const std::shared_ptr<Response>&) { applyRename(serial, name); },
         [this, serial, name, oldName, done](bool ok) {
             if (!ok)

@@ -81,7 +81,14 @@ public:
     // GlobalDirEntry may be another than the model's own. When the entry was
     // deleted elsewhere, the error says so and the tree is read again.
     void loadObject(DirEntryNode* node, const Done& done);
+    // A save refused because the object was changed elsewhere comes as
+    // sgSaveConflict instead of sgErrorOccurred; the node stays modified.
     void saveObject(DirEntryNode* node, const Done& done);
+    // Drops the node's object, changes and all: the next load reads the stored one.
+    void discardObject(DirEntryNode* node);
+    // Saves a copy of the node's object (a new id, "name (copy)") beside it,
+    // as a new entry; the node itself is left as it is.
+    void saveCopy(DirEntryNode* node, const Done& done);
     void createFolder(Node* parentFolder, const std::string& name, const Done& done);
     void renameNode(Node* node, const std::string& name, const Done& done);
     void moveNode(Node* node, Node* targetFolder, const Done& done);
@@ -90,6 +97,10 @@ public:
 signals:
     void sgErrorOccurred(QString message);
     void sgItemChanged(std::shared_ptr<vemi::DirEntry>& entry);
+    // Another program changed the store (see CommandDispatcher::sgStoreChanged).
+    void sgStoreChanged();
+    // The save of the node with this serial was refused: message says why.
+    void sgSaveConflict(quint64 serial, QString message);
 
 protected:
     QIcon iconFor(const Node* node) const override;
@@ -102,6 +113,7 @@ private:
     static std::string folderIdOf(const Node* folder);
     void applyListing(const DirectoryTreeResponse& tree);
     void explainFailedLoad(quint64 serial, const QString& message, const Done& done);
+    void applySave(quint64 serial, quint64 revision, const std::shared_ptr<Response>& response);
     void applyRename(quint64 serial, const std::string& name);
     void undoRename(quint64 serial, const std::string& name, const std::string& oldName);
 

@@ -33,6 +33,7 @@ public:
     void setModel(DirEntryTreeModel* model) { m_model = model; }
     // Not owned, must outlive this object; null brings the standard dialogs back.
     void setAsker(UserAsker* asker);
+    UserAsker* asker() const { return m_asker; }
 
     // Each does nothing when the user cancels; current is the node the user
     // works from (null: the top level).

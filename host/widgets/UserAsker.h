@@ -27,6 +27,10 @@ public:
     // Whether the user answered yes; defaultAnswer is what Enter chooses.
     virtual bool confirm(QWidget* parent, const QString& title, const QString& question,
                          DefaultAnswer defaultAnswer) = 0;
+    // The index of the choice the user took among choices (button texts),
+    // or nothing when the user cancelled; defaultChoice is what Enter takes.
+    virtual std::optional<int> choose(QWidget* parent, const QString& title, const QString& question,
+                                      const QStringList& choices, int defaultChoice) = 0;
 };
 
 } // namespace vemi

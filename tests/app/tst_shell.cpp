@@ -221,6 +221,8 @@ void tst_Shell::otherStoresLiveBesideTheDefault_data()
     QTest::addColumn<QString>("id");
     QTest::addColumn<QString>("file");
     QTest::newRow("a plain name") << "Plant 2" << "/data/Plant 2.sqlite";
+    QTest::newRow("a server address names its database")
+        << "postgresql://qc@db.plant2:5432/templates" << "postgresql://qc@db.plant2:5432/templates";
     QTest::newRow("the default store is not added twice") << "Local" << "";
     QTest::newRow("a path that climbs out is refused") << "../secrets" << "";
     QTest::newRow("an absolute path is refused") << "/etc/passwd" << "";

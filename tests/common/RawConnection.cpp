@@ -1,5 +1,8 @@
 #include "tests/common/RawConnection.h"
 
+#include "host/store/PostgresDialect.h"
+#include "host/store/StoreDialect.h"
+
 #include <QSqlDatabase>
 #include <QSqlQuery>
 
@@ -10,8 +13,12 @@ int s_connections = 0;
 RawConnection::RawConnection(const QString& path)
     : m_name(QStringLiteral("raw-%1").arg(++s_connections))
 {
-    QSqlDatabase database = QSqlDatabase::addDatabase(QStringLiteral("QSQLITE"), m_name);
-    database.setDatabaseName(path);
+    const bool server = vemi::StoreDialect::isServerLocation(path);
+    QSqlDatabase database = QSqlDatabase::addDatabase(server ? QStringLiteral("QPSQL") : QStringLiteral("QSQLITE"), m_name);
+    if (server)
+        vemi::PostgresDialect::applyAddress(database, path);
+    else
+        database.setDatabaseName(path);
     database.open();
 }
 
@@ -24,6 +31,9 @@ RawConnection::~RawConnection()
 bool RawConnection::exec(const QString& sql, const QVariantList& bindings)
 {
     QSqlQuery query(QSqlDatabase::database(m_name));
+    // A server prepares only queries, not statements such as CREATE or BEGIN.
+    if (bindings.isEmpty())
+        return query.exec(sql);
     query.prepare(sql);
     for (const QVariant& value : bindings)
         query.addBindValue(value);

@@ -4,7 +4,8 @@
 #include <QVariant>
 #include <QVariantList>
 
-// A second connection to a store file, as another program would open it:
+// A second connection to a store (a file or a postgresql:// address), as
+// another program would open it:
 // lets a test damage, lock or inspect the file behind the store's back.
 class RawConnection
 {

@@ -28,3 +28,15 @@ bool ScriptedAsker::confirm(QWidget*, const QString& title, const QString& quest
     m_confirmations.pop_front();
     return yes;
 }
+
+std::optional<int> ScriptedAsker::choose(QWidget*, const QString& title, const QString& question,
+                                         const QStringList& choices, int defaultChoice)
+{
+    m_asked << QStringLiteral("%1: %2 [%3, default %4]").arg(title, question, choices.join(QLatin1Char('|')),
+                                                            choices.value(defaultChoice));
+    if (m_choices.empty())
+        return std::nullopt;
+    const std::optional<int> choice = m_choices.front();
+    m_choices.pop_front();
+    return choice;
+}

@@ -1,5 +1,7 @@
 #include "tests/common/TempStore.h"
 
+#include "tests/common/TestPostgresServer.h"
+
 #include "host/domain/BaseObject.h"
 #include "host/store/ErrorInfo.h"
 #include "host/store/GetMarloObject.h"
@@ -10,8 +12,24 @@
 
 #include <cstdio>
 
+namespace {
+TempStore::Backend s_backend = TempStore::Backend::Sqlite;
+} // namespace
+
+void TempStore::setBackend(Backend backend)
+{
+    s_backend = backend;
+}
+
+TempStore::Backend TempStore::backend()
+{
+    return s_backend;
+}
+
 TempStore::TempStore(vemi::StoreOptions options)
-    : m_path(m_dir.filePath(QStringLiteral("store.sqlite")))
+    : m_path(s_backend == Backend::Postgres && TestPostgresServer::shared()
+                 ? TestPostgresServer::shared()->createDatabase()
+                 : m_dir.filePath(QStringLiteral("store.sqlite")))
 {
     reopen(options);
 }

@@ -22,9 +22,15 @@ class TempStore
 public:
     using Answer = vemi::CommandSender::Answer;
 
+    // The kind of store that TempStore makes from now on.
+    enum class Backend { Sqlite, Postgres };
+    static void setBackend(Backend backend);
+    static Backend backend();
+
     explicit TempStore(vemi::StoreOptions options = {});
     ~TempStore();
 
+    // The store's file, or its postgresql:// address.
     QString path() const { return m_path; }
     QString folder() const { return m_dir.path(); }
     vemi::MarloModel& model() { return *m_model; }

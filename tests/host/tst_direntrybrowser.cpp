@@ -2,6 +2,10 @@
 #include "tests/common/ModalAnswer.h"
 #include "tests/common/RawConnection.h"
 #include "tests/common/ScriptedAsker.h"
+#include "host/store/CommandSender.h"
+#include "host/store/UpdateObject.h"
+#include "host/domain/ObjectCodec.h"
+#include "tests/common/TestPostgresServer.h"
 #include "tests/common/TempStore.h"
 
 #include "host/store/CreateFolder.h"
@@ -28,6 +32,9 @@
 #include <QPushButton>
 #include <QScreen>
 #include <QTreeView>
+#include <QProcess>
+#include <QScopeGuard>
+#include <QSignalSpy>
 #include <QtTest>
 
 using namespace vemi;
@@ -175,6 +182,11 @@ private slots:
     void renameAndEditDuringSaveAreKept();
     void folderCommandsAskThenAct_data();
     void folderCommandsAskThenAct();
+    void serverChangesRefreshTheBrowser();
+    void refreshFindsChangesOfAnotherProgram_data();
+    void refreshFindsChangesOfAnotherProgram();
+    void saveConflictOffersCopyOrReload_data();
+    void saveConflictOffersCopyOrReload();
     void editedObjectSurvivesDeletionElsewhere_data();
     void editedObjectSurvivesDeletionElsewhere();
     void deleteQuestionSaysWhatGoes_data();
@@ -508,6 +520,127 @@ void tst_DirEntryBrowser::folderCommandsAskThenAct()
     // What the tree shows is what the store holds.
     Browser restarted(store);
     QTRY_COMPARE(restarted.namesIn(nullptr), topLevel);
+}
+
+// On a server the browser hears of another program's saves by itself.
+void tst_DirEntryBrowser::serverChangesRefreshTheBrowser()
+{
+    if (!TestPostgresServer::shared())
+        QSKIP(qPrintable(QStringLiteral("no PostgreSQL test server: ") + TestPostgresServer::skipReason()));
+    TempStore::setBackend(TempStore::Backend::Postgres);
+    const auto sqliteAgain = qScopeGuard([] { TempStore::setBackend(TempStore::Backend::Sqlite); });
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    const auto opened = browser.find("Door Panel")->object();
+    MarloModel other(store.path());
+    QCOMPARE(other.open(), QString());
+    auto theirs = std::static_pointer_cast<NamedObject>(ObjectCodec::clone<BaseObject>(*opened));
+    theirs->setStoredRevision(opened->storedRevision());
+    theirs->setName("Door Panel, theirs");
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(theirs);
+    QVERIFY(!CommandSender::sendAndWait(other, std::string(), save, 20000).error);
+
+    QTRY_VERIFY_WITH_TIMEOUT(browser.find("Door Panel, theirs") && browser.find("Door Panel, theirs")->object(), 10000);
+    QVERIFY(browser.find("Door Panel, theirs")->object() != opened);
+}
+
+void tst_DirEntryBrowser::refreshFindsChangesOfAnotherProgram_data()
+{
+    QTest::addColumn<bool>("changedHere");
+    QTest::newRow("unchanged here: the stored version is read and handed on") << false;
+    QTest::newRow("changed here: the edit is kept") << true;
+}
+
+void tst_DirEntryBrowser::refreshFindsChangesOfAnotherProgram()
+{
+    QFETCH(bool, changedHere);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    auto* node = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find("Door Panel"));
+    const auto opened = node->object();
+    if (changedHere)
+        browser.modify("Door Panel");
+    QProcess other;
+    other.start(QCoreApplication::applicationDirPath() + QStringLiteral("/storesaver"),
+                {store.path(), QString::fromStdString(QCJobTemplate::typeId()), QString::fromStdString(opened->id()),
+                 QStringLiteral("Door Panel, theirs")});
+    QVERIFY(other.waitForStarted(5000));
+    other.write("go\n");
+    QVERIFY(other.waitForFinished(20000));
+    QCOMPARE(other.readAllStandardOutput(), QByteArray("read\nsaved\n"));
+    QSignalSpy handedOn(&browser.widget, &DirEntryBrowserWidget::sgSelectionChanged);
+
+    browser.widget.refresh();
+    QTRY_COMPARE(node->dirEntry()->header()->name(), std::string("Door Panel, theirs"));
+    if (changedHere) {
+        QCOMPARE(node->object(), opened);
+        QVERIFY(node->isModified());
+        return;
+    }
+    QTRY_VERIFY(node->object() && node->object() != opened);
+    QCOMPARE(node->object()->name(), std::string("Door Panel, theirs"));
+    QTRY_VERIFY(!handedOn.isEmpty());
+    QCOMPARE(handedOn.last().first().value<QVector<Node*>>(), QVector<Node*>{node});
+}
+
+void tst_DirEntryBrowser::saveConflictOffersCopyOrReload_data()
+{
+    QTest::addColumn<int>("choice"); // -1: cancel
+    QTest::addColumn<QString>("edited");   // the description of the open object afterwards
+    QTest::addColumn<bool>("modified");
+    QTest::addColumn<bool>("copied");
+    QTest::newRow("save as copy: the edit is a new entry, the original shows the stored version")
+        << 0 << "theirs" << false << true;
+    QTest::newRow("reload: the stored version replaces the edit") << 1 << "theirs" << false << false;
+    QTest::newRow("cancel: the edit stays open, unsaved") << -1 << "mine" << true << false;
+}
+
+// The template is saved elsewhere while it is open here with changes: the
+// save here is refused and the user chooses what becomes of the edit.
+void tst_DirEntryBrowser::saveConflictOffersCopyOrReload()
+{
+    QFETCH(int, choice);
+    QFETCH(QString, edited);
+    QFETCH(bool, modified);
+    QFETCH(bool, copied);
+    TempStore store;
+    storeTemplate(store, "Door Panel", "");
+    Browser browser(store);
+    ScriptedAsker asker;
+    asker.scriptChoice(choice < 0 ? std::nullopt : std::optional<int>(choice));
+    browser.widget.folderCommands()->setAsker(&asker);
+    QVERIFY(browser.openLoaded("Door Panel"));
+    const auto id = browser.find("Door Panel")->object()->id();
+    browser.find("Door Panel")->object()->setDescription("mine");
+    browser.modify("Door Panel");
+    const auto elsewhere = std::static_pointer_cast<NamedObject>(store.fetch(QCJobTemplate::typeId(), id));
+    elsewhere->setDescription("theirs");
+    QVERIFY(store.save(elsewhere));
+
+    browser.widget.actionSave()->trigger();
+    QTRY_COMPARE(asker.asked().size(), 1);
+    QVERIFY2(asker.asked().first().contains(
+                 QStringLiteral("\"Door Panel\" at the top level (id %1) was changed elsewhere since it was opened")
+                     .arg(QString::fromStdString(id))),
+             qPrintable(asker.asked().first()));
+    Node* original = browser.find("Door Panel");
+    QTRY_VERIFY(original->object() && original->object()->description() == edited.toStdString());
+    QCOMPARE(original->isModified(), modified);
+    QTRY_COMPARE(browser.find("Door Panel (copy)") != nullptr, copied);
+    if (copied) {
+        auto* copy = static_cast<DirEntryTreeModel::DirEntryNode*>(browser.find("Door Panel (copy)"));
+        QTRY_VERIFY(copy->isSaved() && !copy->isModified());
+        const auto stored = std::static_pointer_cast<NamedObject>(
+            store.fetch(QCJobTemplate::typeId(), copy->object()->id()));
+        QVERIFY(stored && stored->description() == "mine");
+    }
+    const auto stored = std::static_pointer_cast<NamedObject>(store.fetch(QCJobTemplate::typeId(), id));
+    QCOMPARE(QString::fromStdString(stored->description()), QStringLiteral("theirs"));
 }
 
 void tst_DirEntryBrowser::editedObjectSurvivesDeletionElsewhere_data()

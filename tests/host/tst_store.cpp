@@ -2,6 +2,7 @@
 #include "tests/common/RawConnection.h"
 #include "tests/common/TempStore.h"
 #include "tests/common/TestLibrary.h"
+#include "tests/common/TestPostgresServer.h"
 
 #include "host/store/CommandDispatcher.h"
 #include "host/store/CreateFolder.h"
@@ -22,6 +23,7 @@
 #include "host/store/QtCommand.h"
 #include "host/store/RenameDirItem.h"
 #include "host/domain/SchematicImage.h"
+#include "host/store/SqliteDialect.h"
 #include "host/store/StoreDatabase.h"
 #include "host/store/UpdateObject.h"
 #include "host/store/UpdateObjectResponse.h"
@@ -30,8 +32,11 @@
 #include <QDir>
 #include <QFile>
 #include <QFileInfo>
+#include <QProcess>
 #include <QScopeGuard>
+#include <QSignalSpy>
 #include <QThread>
+#include <QUrl>
 #include <QtTest>
 
 #include <optional>
@@ -138,13 +143,41 @@ QStringList namesOf(const std::vector<std::shared_ptr<Object>>& objects)
     return names;
 }
 
+bool onServer()
+{
+    return TempStore::backend() == TempStore::Backend::Postgres;
+}
+
+// What another program runs to hold the store's write lock.
+QStringList writeLockStatements()
+{
+    if (onServer())
+        return {QStringLiteral("BEGIN"),
+                QStringLiteral("SELECT pg_advisory_xact_lock(%1)").arg(StoreDatabase::kApplicationId)};
+    return {QStringLiteral("BEGIN EXCLUSIVE")};
+}
+
 } // namespace
+
+#define SERVERS_ONLY()                                                                                         \
+    if (!onServer())                                                                                           \
+        QSKIP("about servers only");
+
+#define SQLITE_FILES_ONLY()                                                                                    \
+    if (onServer())                                                                                            \
+        QSKIP("about SQLite files only");
 
 class tst_Store : public QObject
 {
     Q_OBJECT
 
+    void refusesDatabasesThatAreNotStores(const QString& setup, const QString& expected);
+
 private slots:
+    // Every test runs on both kinds of store: an SQLite file, and a database
+    // on a PostgreSQL server that the tests start.
+    void initTestCase_data();
+    void init();
     void templateSurvivesRestartByteForByte();
     void commandsRunInOrderOffTheCallersThread();
     void droppedWrapperAnswersAndDiesAtHome();
@@ -164,7 +197,30 @@ private slots:
     void folderTreeOperations();
     void deletingFolderDeletesItsObjects();
     void folderCycleDoesNotHangTheStore();
+    void staleSaveIsRefusedAndWritesNothing();
+    void renameCountsAsAChange();
+    void twoProgramsSavingOneTemplateOneWins();
+    void storeOfTheFirstSchemaIsUpgraded();
+    void serverFailuresNameServerAndCause_data();
+    void serverFailuresNameServerAndCause();
+    void serverGoneDuringSaveLosesNothingAcknowledged();
+    void serverAnnouncesWritesOfOthers();
 };
+
+void tst_Store::initTestCase_data()
+{
+    QTest::addColumn<bool>("server");
+    QTest::newRow("SQLite") << false;
+    QTest::newRow("PostgreSQL") << true;
+}
+
+void tst_Store::init()
+{
+    QFETCH_GLOBAL(bool, server);
+    TempStore::setBackend(server ? TempStore::Backend::Postgres : TempStore::Backend::Sqlite);
+    if (server && !TestPostgresServer::shared())
+        QSKIP(qPrintable(QStringLiteral("no PostgreSQL test server: ") + TestPostgresServer::skipReason()));
+}
 
 void tst_Store::templateSurvivesRestartByteForByte()
 {
@@ -264,6 +320,10 @@ void tst_Store::refusesFilesThatAreNotStores()
 {
     QFETCH(QString, setup);
     QFETCH(QString, expected);
+    if (onServer()) {
+        refusesDatabasesThatAreNotStores(setup, expected);
+        return;
+    }
     QTemporaryDir dir;
     const QString path = dir.filePath(QStringLiteral("file.sqlite"));
     if (setup == QLatin1String("text")) {
@@ -291,6 +351,31 @@ void tst_Store::refusesFilesThatAreNotStores()
     QCOMPARE(original.readAll(), before);
 }
 
+// The same checks for a database on the server; nothing is created in it.
+void tst_Store::refusesDatabasesThatAreNotStores(const QString& setup, const QString& expected)
+{
+    if (setup == QLatin1String("text"))
+        QSKIP("a text file is about SQLite files only");
+    const QString address = TestPostgresServer::shared()->createDatabase();
+    if (setup == QLatin1String("unversioned")) {
+        QVERIFY(MarloModel(address).open().isEmpty());
+        QVERIFY(RawConnection(address).exec(QStringLiteral("UPDATE store_mark SET schema_version = 0")));
+    } else if (setup == QLatin1String("foreign")) {
+        QVERIFY(RawConnection(address).exec(QStringLiteral("CREATE TABLE people(name TEXT)")));
+    } else {
+        RawConnection raw(address);
+        QVERIFY(raw.exec(QStringLiteral("CREATE TABLE store_mark(application_id INTEGER, schema_version INTEGER)")));
+        QVERIFY(raw.exec(QStringLiteral("INSERT INTO store_mark VALUES(?, 99)"), {StoreDatabase::kApplicationId}));
+    }
+    const QString tables = QStringLiteral("SELECT string_agg(table_name, ',' ORDER BY table_name)"
+                                          " FROM information_schema.tables WHERE table_schema = 'public'");
+    const QString before = RawConnection(address).scalar(tables).toString();
+
+    const QString error = MarloModel(address).open();
+    QVERIFY2(error.contains(expected) && error.contains(address), qPrintable(error));
+    QCOMPARE(RawConnection(address).scalar(tables).toString(), before);
+}
+
 void tst_Store::refusedWriteIsReportedAndChangesNothing_data()
 {
     QTest::addColumn<bool>("readOnly");
@@ -313,7 +398,8 @@ void tst_Store::refusedWriteIsReportedAndChangesNothing()
         store.reopenReadOnly();
     } else {
         other.emplace(store.path());
-        QVERIFY(other->exec(QStringLiteral("BEGIN EXCLUSIVE")));
+        for (const QString& statement : writeLockStatements())
+            QVERIFY(other->exec(statement));
     }
     jobTemplate->setName("Changed");
 
@@ -465,6 +551,7 @@ void tst_Store::contentOfAnotherTypeIsDamaged()
 // read-only open must do without them where the folder cannot be written.
 void tst_Store::readOnlyOpenInFolderNobodyMayWrite()
 {
+    SQLITE_FILES_ONLY();
     QTemporaryDir folder;
     const QString path = folder.filePath(QStringLiteral("store.sqlite"));
     {
@@ -506,6 +593,7 @@ void tst_Store::readOnlyOpenInFolderNobodyMayWrite()
 // read-only open that skipped the -wal file would still see the object.
 void tst_Store::readOnlyOpenSeesChangesNotYetMerged()
 {
+    SQLITE_FILES_ONLY();
     TempStore store;
     auto removed = makeTemplate("Removed");
     QVERIFY(store.save(makeTemplate("Kept")));
@@ -542,10 +630,11 @@ void tst_Store::explainsSqliteFailures_data()
 
 void tst_Store::explainsSqliteFailures()
 {
+    SQLITE_FILES_ONLY();
     QFETCH(int, code);
     QFETCH(bool, diskFull);
     QFETCH(QString, expected);
-    const QString explained = StoreDatabase::explain(code, diskFull);
+    const QString explained = SqliteDialect::explain(code, diskFull);
     QVERIFY2(expected.isEmpty() ? explained.isEmpty() : explained.contains(expected), qPrintable(explained));
 }
 
@@ -629,6 +718,245 @@ void tst_Store::folderCycleDoesNotHangTheStore()
     QVERIFY(!tree.timedOut && tree.response);
     QVERIFY(deleteItems(store, {first}));
     QVERIFY(getOne(store, kTemplate, nested->id()).error);
+}
+
+
+// Two editors read the same template; the first saves (twice), the second
+// is refused and nothing of its edit is written; once it has read the
+// stored version again it saves.
+void tst_Store::staleSaveIsRefusedAndWritesNothing()
+{
+    TempStore store;
+    auto original = makeTemplate("Door Panel");
+    QVERIFY(store.save(original));
+    auto first = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    auto second = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    QVERIFY(first && second);
+
+    first->setName("Door Panel A");
+    QVERIFY(!update(store, first).error);
+    first->setName("Door Panel A2");
+    QVERIFY2(!update(store, first).error, "a second save from the same editor states the revision it wrote");
+
+    second->setName("Door Panel B");
+    const auto refused = update(store, second);
+    QVERIFY(refused.error);
+    QVERIFY(refused.error->isConflict());
+    const QString message = refused.error->message();
+    QVERIFY2(message.contains(QStringLiteral("\"Door Panel A2\" (id "))
+                 && message.contains(QStringLiteral("was changed elsewhere since it was opened")),
+             qPrintable(message));
+    QCOMPARE(store.fetch(kTemplate, original->id())->header()->name(), std::string("Door Panel A2"));
+
+    auto reread = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, original->id()));
+    reread->setName("Door Panel B");
+    QVERIFY(!update(store, reread).error);
+    QCOMPARE(store.fetch(kTemplate, original->id())->header()->name(), std::string("Door Panel B"));
+}
+
+// A rename elsewhere refuses a save from before it; the renaming editor's
+// own copy saves on.
+void tst_Store::renameCountsAsAChange()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    const std::string topLevel;
+    const std::string entryId = entryIdOf(store.save(jobTemplate, &topLevel));
+    QVERIFY(!entryId.empty());
+    auto elsewhere = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+    auto renaming = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+
+    renaming->setName("Door Trim");
+    auto rename = std::make_shared<RenameDirItem>(DirItemKind::Entry, entryId, "Door Trim");
+    rename->setOpenObject(renaming);
+    QVERIFY(!store.run(rename).error);
+
+    elsewhere->setDescription("changed elsewhere");
+    const auto refused = update(store, elsewhere);
+    QVERIFY(refused.error && refused.error->isConflict());
+    renaming->setDescription("changed by the renaming editor");
+    QVERIFY(!update(store, renaming).error);
+    const auto stored = std::static_pointer_cast<QCJobTemplate>(store.fetch(kTemplate, jobTemplate->id()));
+    QCOMPARE(stored->name(), std::string("Door Trim"));
+    QCOMPARE(stored->description(), std::string("changed by the renaming editor"));
+}
+
+// Two other programs read the template, then save it at the same moment.
+void tst_Store::twoProgramsSavingOneTemplateOneWins()
+{
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    QVERIFY(store.save(jobTemplate));
+    const QString saver = QCoreApplication::applicationDirPath() + QStringLiteral("/storesaver");
+    QProcess programs[2];
+    const QStringList names{QStringLiteral("Saved by one"), QStringLiteral("Saved by two")};
+    for (int i = 0; i < 2; ++i) {
+        programs[i].start(saver, {store.path(), QString::fromStdString(kTemplate), QString::fromStdString(jobTemplate->id()),
+                                  names[i]});
+        QVERIFY(programs[i].waitForStarted(5000));
+    }
+    const auto stopAll = qScopeGuard([&programs] {
+        for (QProcess& program : programs) {
+            program.kill();
+            program.waitForFinished(5000);
+        }
+    });
+    for (QProcess& program : programs) {
+        QVERIFY(program.waitForReadyRead(20000));
+        QCOMPARE(program.readLine().trimmed(), QByteArray("read"));
+    }
+    for (QProcess& program : programs)
+        program.write("go\n");
+    QStringList outcomes;
+    for (QProcess& program : programs) {
+        QVERIFY(program.waitForFinished(20000));
+        outcomes << QString::fromUtf8(program.readAllStandardOutput().trimmed());
+    }
+    QCOMPARE(outcomes.count(QStringLiteral("saved")), 1);
+    const int winner = outcomes.indexOf(QStringLiteral("saved"));
+    const QString refusal = outcomes[1 - winner];
+    QVERIFY2(refusal.startsWith(QStringLiteral("refused: Cannot save \"Saved by "))
+                 && refusal.contains(QStringLiteral("was changed elsewhere since it was opened")),
+             qPrintable(refusal));
+    QCOMPARE(QString::fromStdString(store.fetch(kTemplate, jobTemplate->id())->header()->name()), names[winner]);
+}
+
+// A store written before objects had revisions: its objects read and save as before.
+void tst_Store::storeOfTheFirstSchemaIsUpgraded()
+{
+    SQLITE_FILES_ONLY();
+    QTemporaryDir dir;
+    const QString path = dir.filePath(QStringLiteral("old.sqlite"));
+    auto jobTemplate = makeTemplate("Door Panel");
+    {
+        RawConnection raw(path);
+        for (const char* statement :
+             {"CREATE TABLE folders(id TEXT PRIMARY KEY, object_type TEXT NOT NULL,"
+              " parent_id TEXT REFERENCES folders(id) ON DELETE CASCADE, name TEXT NOT NULL)",
+              "CREATE TABLE objects(id TEXT PRIMARY KEY, type TEXT NOT NULL, name TEXT NOT NULL, data BLOB NOT NULL)",
+              "CREATE TABLE dir_entries(id TEXT PRIMARY KEY,"
+              " object_id TEXT NOT NULL UNIQUE REFERENCES objects(id) ON DELETE CASCADE,"
+              " folder_id TEXT REFERENCES folders(id) ON DELETE CASCADE)",
+              "PRAGMA user_version = 1"})
+            QVERIFY(raw.exec(QString::fromLatin1(statement)));
+        QVERIFY(raw.exec(QStringLiteral("PRAGMA application_id = %1").arg(StoreDatabase::kApplicationId)));
+        QVERIFY(raw.exec(QStringLiteral("INSERT INTO objects VALUES(?, ?, ?, ?)"),
+                         {QString::fromStdString(jobTemplate->id()), QString::fromStdString(kTemplate),
+                          QStringLiteral("Door Panel"), ObjectCodec::serialize(*jobTemplate)}));
+    }
+    MarloModel model(path);
+    QCOMPARE(model.open(), QString());
+    auto get = std::make_shared<GetMarloObject>();
+    get->setType(kTemplate);
+    get->setId(jobTemplate->id());
+    const auto fetched = std::dynamic_pointer_cast<GetMarloObjectResponse>(
+        CommandSender::sendAndWait(model, std::string(), get, 20000).response);
+    QVERIFY(fetched && fetched->object());
+    QCOMPARE(fetched->object()->storedRevision(), std::int64_t(1));
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(fetched->object());
+    QVERIFY(!CommandSender::sendAndWait(model, std::string(), save, 20000).error);
+    QCOMPARE(RawConnection(path).scalar(QStringLiteral("PRAGMA user_version")).toInt(), StoreDatabase::schemaVersion());
+}
+
+void tst_Store::serverFailuresNameServerAndCause_data()
+{
+    QTest::addColumn<QString>("user");
+    QTest::addColumn<QString>("socketFolder"); // empty: the test server's
+    QTest::addColumn<QString>("cause");
+    QTest::newRow("no server at the address") << "postgres" << "/nonexistent-socket-folder" << "cannot be reached";
+    QTest::newRow("a user the server does not know") << "nobody here" << "" << "refused the login";
+    QTest::newRow("quotes and semicolons stay in the user name")
+        << "x'; DROP TABLE objects; --" << "" << "refused the login";
+    QTest::newRow("a password in the address is refused, not sent") << "postgres:secret" << "" << "~/.pgpass";
+}
+
+void tst_Store::serverFailuresNameServerAndCause()
+{
+    SERVERS_ONLY();
+    QFETCH(QString, user);
+    QFETCH(QString, socketFolder);
+    QFETCH(QString, cause);
+    TempStore store;
+    const auto kept = makeTemplate("Kept");
+    QVERIFY(store.save(kept));
+    QUrl address(TestPostgresServer::shared()->addressAs(user.section(QLatin1Char(':'), 0, 0),
+                                                         QUrl(store.path()).path().mid(1)));
+    address.setPassword(user.section(QLatin1Char(':'), 1));
+    if (!socketFolder.isEmpty())
+        address.setQuery(QStringLiteral("host=") + socketFolder);
+    const QString text = address.toString(QUrl::FullyEncoded);
+
+    const QString error = MarloModel(text).open();
+    const bool named = address.password().isEmpty() ? error.contains(text) : !error.contains(QLatin1String("secret"));
+    QVERIFY2(error.contains(cause) && named, qPrintable(error));
+    QVERIFY(store.fetch(kTemplate, kept->id()));
+}
+
+// The server stops while a save of a large template is under way: either the
+// save was acknowledged and is there once the server is back, or it failed,
+// saying why, and saving again then succeeds.
+void tst_Store::serverGoneDuringSaveLosesNothingAcknowledged()
+{
+    SERVERS_ONLY();
+    TestPostgresServer* server = TestPostgresServer::shared();
+    const auto restart = qScopeGuard([server] { server->start(); });
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel", 10 << 20);
+    QVERIFY(store.save(jobTemplate));
+    jobTemplate->setName("Door Panel, changed");
+    std::optional<TempStore::Answer> answer;
+    auto save = std::make_shared<UpdateObject>();
+    save->setObject(jobTemplate);
+    QObject context;
+    CommandSender::send(store.model(), std::string(), save, &context,
+                        [&answer](const std::shared_ptr<Response>& response) { answer = TempStore::Answer{response, nullptr}; },
+                        [&answer](const std::shared_ptr<ErrorInfo>& error) { answer = TempStore::Answer{{}, error}; });
+    QVERIFY(server->kill());
+    QTRY_VERIFY_WITH_TIMEOUT(answer.has_value(), 20000);
+    const auto namesServerAndCause = [&store](const QString& message) {
+        return message.contains(store.path())
+            && (message.contains(QStringLiteral("cannot be reached"))
+                || message.contains(QStringLiteral("connection to the server was lost")));
+    };
+    if (answer->error) {
+        QVERIFY2(namesServerAndCause(answer->error->message()), qPrintable(answer->error->message()));
+        const auto whileDown = update(store, jobTemplate);
+        QVERIFY(whileDown.error);
+        QVERIFY2(namesServerAndCause(whileDown.error->message()), qPrintable(whileDown.error->message()));
+    }
+    QVERIFY(server->start());
+    if (answer->error)
+        QVERIFY(store.save(jobTemplate));
+    const auto stored = store.fetch(kTemplate, jobTemplate->id());
+    QVERIFY(stored);
+    QCOMPARE(ObjectCodec::serialize(*stored), ObjectCodec::serialize(*jobTemplate));
+}
+
+// Each write of another program is announced; the store's own are not.
+void tst_Store::serverAnnouncesWritesOfOthers()
+{
+    SERVERS_ONLY();
+    TempStore store;
+    auto jobTemplate = makeTemplate("Door Panel");
+    QVERIFY(store.save(jobTemplate));
+    QSignalSpy announced(store.model().commandDispatcher(std::string()).get(), &CommandDispatcher::sgStoreChanged);
+    MarloModel other(store.path());
+    QCOMPARE(other.open(), QString());
+    const auto saveElsewhere = [&other](const std::shared_ptr<BaseObject>& object) {
+        auto save = std::make_shared<UpdateObject>();
+        save->setObject(object);
+        return !CommandSender::sendAndWait(other, std::string(), save, 20000).error;
+    };
+
+    QVERIFY(saveElsewhere(makeTemplate("Bonnet")));
+    QTRY_COMPARE_WITH_TIMEOUT(announced.count(), 1, 10000);
+    jobTemplate->setName("Door Panel, changed here");
+    QVERIFY(store.save(jobTemplate));
+    QVERIFY(saveElsewhere(makeTemplate("Bumper")));
+    // Announcements come in the order of the writes: the own one came first.
+    QTRY_VERIFY_WITH_TIMEOUT(announced.count() >= 2, 10000);
+    QCOMPARE(announced.count(), 2);
 }
 
 QC_TEST_GUILESS_MAIN(tst_Store)
