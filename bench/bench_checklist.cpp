@@ -16,6 +16,7 @@
 
 #include "bench/RecordingReporter.h"
 
+#include "bench/BenchmarkArguments.h"
 #include <benchmark/benchmark.h>
 
 #include <QApplication>
@@ -111,15 +112,10 @@ int main(int argc, char** argv)
 {
     if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
         qputenv("QT_QPA_PLATFORM", "offscreen");
-    char interleave[] = "--benchmark_enable_random_interleaving=true";
-    std::vector<char*> arguments{argv[0], interleave};
-    arguments.insert(arguments.end(), argv + 1, argv + argc);
-    arguments.push_back(nullptr);
-    int argumentCount = int(arguments.size()) - 1;
-    benchmark::Initialize(&argumentCount, arguments.data());
-    if (benchmark::ReportUnrecognizedArguments(argumentCount, arguments.data()))
+    BenchmarkArguments arguments(argc, argv);
+    if (!arguments.initialize())
         return 1;
-    QApplication app(argumentCount, arguments.data());
+    QApplication app(arguments.count(), arguments.values());
 
     QTemporaryDir folder;
     vemi::MarloModel store(folder.filePath(QStringLiteral("store.sqlite")));

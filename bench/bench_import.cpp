@@ -11,6 +11,7 @@
 #include "host/store/ErrorInfo.h"
 #include "host/store/MarloModel.h"
 
+#include "bench/BenchmarkArguments.h"
 #include <benchmark/benchmark.h>
 #include <lcms2.h>
 
@@ -115,15 +116,10 @@ void importIntoStore(benchmark::State& state, QString path, QString storeFolder)
 
 int main(int argc, char** argv)
 {
-    char interleave[] = "--benchmark_enable_random_interleaving=true";
-    std::vector<char*> arguments{argv[0], interleave};
-    arguments.insert(arguments.end(), argv + 1, argv + argc);
-    arguments.push_back(nullptr);
-    int argumentCount = int(arguments.size()) - 1;
-    benchmark::Initialize(&argumentCount, arguments.data());
-    if (benchmark::ReportUnrecognizedArguments(argumentCount, arguments.data()))
+    BenchmarkArguments arguments(argc, argv);
+    if (!arguments.initialize())
         return 1;
-    QCoreApplication app(argumentCount, arguments.data());
+    QCoreApplication app(arguments.count(), arguments.values());
 
     QTemporaryDir folder;
     QFile file(folder.filePath(QStringLiteral("standards.txt")));

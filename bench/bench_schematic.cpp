@@ -21,6 +21,7 @@
 
 #include "bench/RecordingReporter.h"
 
+#include "bench/BenchmarkArguments.h"
 #include <benchmark/benchmark.h>
 
 #include <QAbstractButton>
@@ -217,13 +218,8 @@ void printRatio(const RecordingReporter& reporter, const char* what, const std::
 
 int main(int argc, char** argv)
 {
-    char interleave[] = "--benchmark_enable_random_interleaving=true";
-    std::vector<char*> arguments{argv[0], interleave};
-    arguments.insert(arguments.end(), argv + 1, argv + argc);
-    arguments.push_back(nullptr);
-    int argumentCount = int(arguments.size()) - 1;
-    benchmark::Initialize(&argumentCount, arguments.data());
-    if (benchmark::ReportUnrecognizedArguments(argumentCount, arguments.data()))
+    BenchmarkArguments arguments(argc, argv);
+    if (!arguments.initialize())
         return 1;
 
     if (!qEnvironmentVariableIsSet("QT_QPA_PLATFORM"))
@@ -231,7 +227,7 @@ int main(int argc, char** argv)
     QStandardPaths::setTestModeEnabled(true);
     QTemporaryDir folder;
     QSettings::setPath(QSettings::NativeFormat, QSettings::UserScope, folder.path());
-    QApplication app(argumentCount, arguments.data());
+    QApplication app(arguments.count(), arguments.values());
 
     const QByteArray png = tenMegabytes("PNG");
     const QByteArray jpeg = tenMegabytes("JPEG");

@@ -18,6 +18,7 @@
 #include "host/store/UpdateObject.h"
 #include "bench/RecordingReporter.h"
 
+#include "bench/BenchmarkArguments.h"
 #include <benchmark/benchmark.h>
 #include <sqlite3.h>
 
@@ -349,18 +350,10 @@ bool reportSaveStall(vemi::CommandDispatcher& dispatcher, const std::shared_ptr<
 
 int main(int argc, char** argv)
 {
-    // Interleaving is on unless the command line turns it off (a later flag wins).
-    char interleave[] = "--benchmark_enable_random_interleaving=true";
-    std::vector<char*> arguments{argv[0], interleave};
-    arguments.insert(arguments.end(), argv + 1, argv + argc);
-    arguments.push_back(nullptr);
-    int argumentCount = int(arguments.size()) - 1;
-
-    // Google Benchmark takes its own flags out before Qt sees the rest.
-    benchmark::Initialize(&argumentCount, arguments.data());
-    if (benchmark::ReportUnrecognizedArguments(argumentCount, arguments.data()))
+    BenchmarkArguments arguments(argc, argv);
+    if (!arguments.initialize())
         return 1;
-    QCoreApplication app(argumentCount, arguments.data());
+    QCoreApplication app(arguments.count(), arguments.values());
 
     QTemporaryDir folder;
     if (!folder.isValid()) {
