@@ -233,23 +233,7 @@ void tst_CheckZonePropertiesDialog::placeholderNameIsSelected()
 
 void tst_CheckZonePropertiesDialog::removeProperties_data()
 {
-    // Four definitions P0..P3; "values" names the definitions that have a
-    // value, in the order the values are stored.
-    QTest::addColumn<QList<int>>("clickedRows");
-    QTest::addColumn<QStringList>("values");
-    QTest::addColumn<QStringList>("remainingDefinitions");
-    QTest::addColumn<QStringList>("remainingValues");
-    const QStringList all{"P0", "P1", "P2", "P3"};
-    QTest::newRow("rows 0 and 2 clicked downwards")
-        << QList<int>{0, 2} << all << QStringList{"P1", "P3"} << QStringList{"P1=v1", "P3=v3"};
-    QTest::newRow("rows 2 and 0 clicked upwards")
-        << QList<int>{2, 0} << all << QStringList{"P1", "P3"} << QStringList{"P1=v1", "P3=v3"};
-    QTest::newRow("row 3 when only two values exist")
-        << QList<int>{3} << QStringList{"P0", "P1"} << QStringList{"P0", "P1", "P2"} << QStringList{"P0=v0", "P1=v1"};
-    QTest::newRow("row 1 when P0 and P2 have no value")
-        << QList<int>{1} << QStringList{"P1", "P3"} << QStringList{"P0", "P2", "P3"} << QStringList{"P3=v3"};
-    QTest::newRow("values stored in another order than the definitions")
-        << QList<int>{0, 3} << QStringList{"P3", "P2", "P0"} << QStringList{"P1", "P2"} << QStringList{"P2=v2"};
+    addRemovalRows();
 }
 
 void tst_CheckZonePropertiesDialog::removeProperties()
@@ -259,13 +243,8 @@ void tst_CheckZonePropertiesDialog::removeProperties()
     QFETCH(QStringList, remainingDefinitions);
     QFETCH(QStringList, remainingValues);
     std::vector<std::shared_ptr<TagDefinition>> definitions;
-    for (int i = 0; i < 4; ++i)
-        definitions.push_back(definition("P" + std::to_string(i)));
     std::vector<std::shared_ptr<TagValue>> tagValues;
-    for (const QString& name : values) {
-        const int i = name.mid(1).toInt();
-        tagValues.push_back(TagValue::forDefinition(*definitions[std::size_t(i)], "v" + std::to_string(i)));
-    }
+    numberedProperties(values, &definitions, &tagValues);
     m_checkPoint->setTagDefinitions(definitions);
     m_checkPoint->setTagValues(tagValues);
     m_dialog = makeDialog();

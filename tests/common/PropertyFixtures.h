@@ -4,7 +4,9 @@
 #include "host/domain/TagValue.h"
 #include "host/store/GetMarloObjectResponse.h"
 
+#include <QList>
 #include <QString>
+#include <QtTest>
 #include <QStringList>
 
 #include <memory>
@@ -58,6 +60,40 @@ inline QStringList valueTexts(const std::vector<std::shared_ptr<vemi::TagDefinit
         result << text;
     }
     return result;
+}
+
+// Rows for removing properties: four definitions P0..P3, of which "values"
+// names those that have a value, in the order the values are stored; the
+// rows clicked; what remains.
+inline void addRemovalRows()
+{
+    QTest::addColumn<QList<int>>("clickedRows");
+    QTest::addColumn<QStringList>("values");
+    QTest::addColumn<QStringList>("remainingDefinitions");
+    QTest::addColumn<QStringList>("remainingValues");
+    const QStringList all{"P0", "P1", "P2", "P3"};
+    QTest::newRow("rows 0 and 2 clicked downwards")
+        << QList<int>{0, 2} << all << QStringList{"P1", "P3"} << QStringList{"P1=v1", "P3=v3"};
+    QTest::newRow("rows 2 and 0 clicked upwards")
+        << QList<int>{2, 0} << all << QStringList{"P1", "P3"} << QStringList{"P1=v1", "P3=v3"};
+    QTest::newRow("row 3 when only two values exist")
+        << QList<int>{3} << QStringList{"P0", "P1"} << QStringList{"P0", "P1", "P2"} << QStringList{"P0=v0", "P1=v1"};
+    QTest::newRow("row 1 when P0 and P2 have no value")
+        << QList<int>{1} << QStringList{"P1", "P3"} << QStringList{"P0", "P2", "P3"} << QStringList{"P3=v3"};
+    QTest::newRow("values stored in another order than the definitions")
+        << QList<int>{0, 3} << QStringList{"P3", "P2", "P0"} << QStringList{"P1", "P2"} << QStringList{"P2=v2"};
+}
+
+// The definitions P0..P3 and a value "v<i>" for each Pi that values names.
+inline void numberedProperties(const QStringList& values, std::vector<std::shared_ptr<vemi::TagDefinition>>* definitions,
+                               std::vector<std::shared_ptr<vemi::TagValue>>* tagValues)
+{
+    for (int i = 0; i < 4; ++i)
+        definitions->push_back(definition("P" + std::to_string(i)));
+    for (const QString& name : values) {
+        const int i = name.mid(1).toInt();
+        tagValues->push_back(vemi::TagValue::forDefinition(*(*definitions)[std::size_t(i)], "v" + std::to_string(i)));
+    }
 }
 
 } // namespace PropertyFixtures
